@@ -1,0 +1,105 @@
+#include "core/stereo_manager.h"
+
+#include <fcntl.h>
+#include <unistd.h>
+
+#include <cstdio>
+#include <cstring>
+
+#include "core/gl_layer.h"
+#include "platform/device_path.h"
+
+namespace ovo {
+
+namespace {
+constexpr char NO_PROCESS_NAME[] = "no.proc.name";
+
+bool IsWhitespace(char byte) { return (byte >= 9 && byte <= 13) || byte == ' '; }
+}  // namespace
+
+StereoManager& StereoManager::instance() {
+    // Thread-safe one-time construction; destroyed at process exit.
+    static StereoManager manager;
+    return manager;
+}
+
+StereoManager::StereoManager()
+    : m_viewport{0, 0, 0, 0},
+      m_scissor{0, 0, 0, 0},
+      m_program(0),
+      m_depth_shift_location(0),
+      m_depth_plane(0.0f),
+      m_last_texture(0),
+      m_frame_draws(0),
+      m_depth_unit(0.0025f),
+      m_depth_step(2.0f),
+      m_depth_start(5.0f),
+      m_process_name{},
+      m_profile(nullptr),
+      m_layer(nullptr),
+      m_frame_number(0),
+      m_es2_layer_installed(false),
+      m_scale_x(1.0f),
+      m_scale_y(1.0f),
+      m_interleave(false) {
+    ReadProcessName(m_process_name);
+    m_profile = new StereoProfile();
+    m_layer = CreateLayerForMode(m_profile->ResolveMode());
+    UpdateScale();
+}
+
+StereoManager::~StereoManager() {
+    if (m_layer != nullptr) delete m_layer;
+    if (m_profile != nullptr) delete m_profile;
+    m_layer = nullptr;
+    m_profile = nullptr;
+    m_interleave = false;
+    m_es2_layer_installed = false;
+}
+
+GlLayer* StereoManager::CreateLayerForMode(StereoMode mode) {
+    // Every mode draws flat until the stereo layers exist.
+    (void)mode;
+    return new PassThroughLayer();
+}
+
+void StereoManager::InstallEs2Layer() {
+    if (m_es2_layer_installed) return;
+    m_es2_layer_installed = true;
+    if (m_layer != nullptr) delete m_layer;
+    m_layer = new PassThroughLayer();
+}
+
+void StereoManager::UpdateScale() {
+    m_scale_x = static_cast<float>(m_profile->m_width) / static_cast<float>(m_profile->m_target_width);
+    m_scale_y = static_cast<float>(m_profile->m_height) / static_cast<float>(m_profile->m_target_height);
+}
+
+void StereoManager::ReadProcessName(char* buffer) {
+    char path[64];
+    std::snprintf(path, sizeof(path), "/proc/%d/cmdline", static_cast<int>(getpid()));
+    int file = open(path, O_RDONLY);
+    if (file < 0) {
+        std::memcpy(buffer, NO_PROCESS_NAME, sizeof(NO_PROCESS_NAME));
+        return;
+    }
+    // A name that fills the buffer is cut, so the last byte always terminates it.
+    size_t length = 0;
+    while (length < PROCESS_NAME_CAPACITY - 1) {
+        char byte;
+        if (read(file, &byte, 1) != 1) break;
+        if (IsWhitespace(byte)) break;
+        buffer[length++] = byte;
+        if (byte == '\0') break;
+    }
+    buffer[length] = '\0';
+    close(file);
+}
+
+void PrepareDisplay() {
+    StereoManager::instance();
+    char path[DEVICE_PATH_CAPACITY];
+    if (MakeDevicePath(PROFILE_PATH, path, sizeof(path))) unlink(path);
+}
+
+}  // namespace ovo

@@ -1,0 +1,74 @@
+#ifndef OVO_CORE_STEREO_MANAGER_H
+#define OVO_CORE_STEREO_MANAGER_H
+
+#include <cstddef>
+#include <cstdint>
+
+#include "config/stereo_profile.h"
+#include "core/gl_api.h"
+
+namespace ovo {
+
+class GlLayer;
+
+// A rectangle as glViewport and glScissor take it.
+struct GlRect {
+    int32_t m_x;
+    int32_t m_y;
+    int32_t m_width;
+    int32_t m_height;
+};
+
+constexpr size_t PROCESS_NAME_CAPACITY = 1024;
+
+// The one process-wide object that owns the library's state. Plain fields: the entry
+// points, the layers and the EGL calls read and write them directly.
+class StereoManager {
+public:
+    // The single manager; the first call in the process builds it.
+    static StereoManager& instance();
+
+    StereoManager();
+    ~StereoManager();
+    StereoManager(const StereoManager&) = delete;
+    StereoManager& operator=(const StereoManager&) = delete;
+
+    // The layer class that handles `mode`; the caller owns it.
+    static GlLayer* CreateLayerForMode(StereoMode mode);
+    // Exchanges the layer, once per process, for the OpenGL ES 2.0 one.
+    void InstallEs2Layer();
+    // m_scale_x and m_scale_y from the profile's output and target sizes.
+    void UpdateScale();
+    float ScaleX() const { return m_scale_x; }
+    float ScaleY() const { return m_scale_y; }
+
+    // The first argument of this process's command line, cut at the first whitespace.
+    static void ReadProcessName(char* buffer);
+
+    GlRect m_viewport;
+    GlRect m_scissor;
+    GLuint m_program;
+    GLint m_depth_shift_location;
+    float m_depth_plane;
+    GLuint m_last_texture;
+    uint32_t m_frame_draws;
+    float m_depth_unit;
+    float m_depth_step;
+    float m_depth_start;
+    char m_process_name[PROCESS_NAME_CAPACITY];
+    StereoProfile* m_profile;
+    GlLayer* m_layer;
+    uint32_t m_frame_number;
+    bool m_es2_layer_installed;
+    float m_scale_x;
+    float m_scale_y;
+    bool m_interleave;
+};
+
+// eglGetDisplay's start-up step once the driver is bound: builds the manager if needed
+// and deletes the profile file, which belongs to one process start only.
+void PrepareDisplay();
+
+}  // namespace ovo
+
+#endif
