@@ -1,0 +1,129 @@
+// What context creation and make-current set up: the layer, the version report and the
+// sizes taken from the draw surface.
+#include <gtest/gtest.h>
+
+#include <filesystem>
+#include <fstream>
+#include <sstream>
+#include <string>
+
+#include "config/version_report.h"
+#include "core/entry_tables.h"
+#include "core/stereo_manager.h"
+#include "support/egl_session.h"
+#include "support/forwarding_check.h"
+#include "support/vendor_root.h"
+
+namespace {
+
+const std::string REPORT = OVO_TEST_DEVICE_ROOT "/sdcard/duoscope/version.txt";
+
+std::string ReadReport() {
+    std::ifstream file(REPORT);
+    std::stringstream text;
+    text << file.rdbuf();
+    return text.str();
+}
+
+class EglContextTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        vendor_root::InstallRecorder();
+        std::filesystem::remove_all(OVO_TEST_DEVICE_ROOT "/sdcard");
+        std::filesystem::create_directories(OVO_TEST_DEVICE_ROOT "/sdcard/duoscope");
+        m_egl.Open();
+        ASSERT_NE(m_egl.m_display, EGL_NO_DISPLAY);
+    }
+
+    ovo::StereoManager& Manager() { return ovo::StereoManager::instance(); }
+    ovo::StereoProfile& Profile() { return *Manager().m_profile; }
+
+    EglSession m_egl;
+};
+
+TEST_F(EglContextTest, AnEnabledProcessReportsEachNewContext) {
+    Profile().m_enabled = true;
+    m_egl.CreateContext(2);
+    std::string prefix = std::string(ovo::VersionReport::BuildTag()) + "\n[package name]\n\t" +
+                         Manager().m_process_name + "\n[gl version]\n\t";
+    EXPECT_EQ(ReadReport(), prefix + "OpenGL ES 2.0\n");
+    eglCreateContext(m_egl.m_display, nullptr, EGL_NO_CONTEXT, nullptr);
+    EXPECT_EQ(ReadReport(), prefix + "OpenGL ES 1.x\n") << "the second report replaces the first";
+    EXPECT_EQ(std::string(ovo::VersionReport::BuildTag()).rfind("(r ", 0), 0u);
+}
+
+TEST_F(EglContextTest, ADisabledProcessWritesNoReportAndKeepsItsLayer) {
+    ovo::GlLayer* layer = Manager().m_layer;
+    ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
+    EXPECT_FALSE(std::filesystem::exists(REPORT));
+    EXPECT_EQ(Manager().m_layer, layer);
+    EXPECT_FALSE(Manager().m_es2_layer_installed);
+    ResetRecorder();
+    glFlush();
+    EXPECT_NE(FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glFlush), nullptr);
+}
+
+TEST_F(EglContextTest, TheEs2LayerIsInstalledOnceAndKept) {
+    Profile().m_enabled = true;
+    m_egl.CreateContext(1);
+    EXPECT_FALSE(Manager().m_es2_layer_installed);
+    m_egl.CreateContext(2);
+    EXPECT_TRUE(Manager().m_es2_layer_installed);
+    ovo::GlLayer* es2_layer = Manager().m_layer;
+    m_egl.CreateContext(2);
+    m_egl.CreateContext(1);
+    EXPECT_EQ(Manager().m_layer, es2_layer);
+}
+
+TEST_F(EglContextTest, TheFirstSurfaceFillsMissingSizes) {
+    Manager().m_viewport = ovo::GlRect{3, 4, 0, 0};
+    Manager().m_scissor = ovo::GlRect{0, 0, 640, 360};
+    ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
+    const ovo::StereoProfile& profile = Profile();
+    for (int32_t width : {profile.m_target_width, profile.m_screen_width, profile.m_width}) {
+        EXPECT_EQ(width, 1280);
+    }
+    for (int32_t height : {profile.m_target_height, profile.m_screen_height, profile.m_height}) {
+        EXPECT_EQ(height, 720);
+    }
+    EXPECT_EQ(Manager().ScaleX(), 1.0f);
+    EXPECT_EQ(Manager().ScaleY(), 1.0f);
+    EXPECT_EQ(Manager().m_viewport.m_x, 3);
+    EXPECT_EQ(Manager().m_viewport.m_width, 1280);
+    EXPECT_EQ(Manager().m_viewport.m_height, 720);
+    EXPECT_EQ(Manager().m_scissor.m_width, 640) << "a set rectangle keeps its size";
+
+    // Later surfaces change nothing that is set.
+    RecorderGetState()->m_surface_width = 320;
+    ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
+    EXPECT_EQ(Profile().m_target_width, 1280);
+    EXPECT_EQ(Manager().m_viewport.m_width, 1280);
+}
+
+TEST_F(EglContextTest, ProfileSizesWinOverTheSurface) {
+    ovo::StereoProfile& profile = Profile();
+    profile.m_target_width = 800;
+    profile.m_target_height = 480;
+    profile.m_width = 1280;
+    profile.m_height = 720;
+    // A refused make-current with a context still takes the sizes.
+    RecorderGetState()->m_make_current_fails = true;
+    EXPECT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(1)), EGL_FALSE);
+    EXPECT_EQ(profile.m_target_width, 800);
+    EXPECT_EQ(Manager().ScaleX(), 1.6f);
+    EXPECT_EQ(Manager().ScaleY(), 1.5f);
+    EXPECT_EQ(Manager().m_viewport.m_width, 1280);
+}
+
+TEST_F(EglContextTest, EveryDisplayRequestDeletesTheProfileFile) {
+    const std::string profile = OVO_TEST_DEVICE_ROOT "/sdcard/stereoconv/game/stereo_gm.ovo";
+    std::filesystem::create_directories(OVO_TEST_DEVICE_ROOT "/sdcard/stereoconv/game");
+    for (int round = 0; round < 2; ++round) {
+        std::ofstream(profile) << "profile";
+        EXPECT_NE(eglGetDisplay(EGL_DEFAULT_DISPLAY), EGL_NO_DISPLAY);
+        EXPECT_FALSE(std::filesystem::exists(profile)) << round;
+    }
+    EXPECT_NE(eglGetDisplay(EGL_DEFAULT_DISPLAY), EGL_NO_DISPLAY) << "no file is no error";
+}
+
+}  // namespace
