@@ -27,17 +27,22 @@ function(ovo_add_gles_library name kind root)
   endif()
 endfunction()
 
-# ovo_link_mesa_vendor(TARGET ROOT): after TARGET is built, ROOT's vendor folder holds the
-# host's Mesa EGL, OpenGL ES 1.x and 2.0 libraries under the first GPU tag.
+# ovo_link_vendor(TARGET ROOT EGL GLES1 GLES2): after TARGET is built, ROOT's vendor folder
+# holds the three given libraries under the first GPU tag.
+function(ovo_link_vendor target root egl gles1 gles2)
+  set(dir "${root}/system/vendor/lib/egl")
+  add_custom_command(TARGET ${target} POST_BUILD
+    COMMAND ${CMAKE_COMMAND} -E make_directory "${dir}"
+    COMMAND ${CMAKE_COMMAND} -E create_symlink "${egl}" "${dir}/libEGL_mali.so"
+    COMMAND ${CMAKE_COMMAND} -E create_symlink "${gles1}" "${dir}/libGLESv1_CM_mali.so"
+    COMMAND ${CMAKE_COMMAND} -E create_symlink "${gles2}" "${dir}/libGLESv2_mali.so"
+    VERBATIM)
+endfunction()
+
+# ovo_link_mesa_vendor(TARGET ROOT): the host's Mesa as the vendor of ROOT.
 function(ovo_link_mesa_vendor target root)
   find_library(OVO_MESA_EGL NAMES libEGL.so.1 EGL REQUIRED)
   find_library(OVO_MESA_GLES1 NAMES libGLESv1_CM.so.1 GLESv1_CM REQUIRED)
   find_library(OVO_MESA_GLES2 NAMES libGLESv2.so.2 GLESv2 REQUIRED)
-  set(dir "${root}/system/vendor/lib/egl")
-  add_custom_command(TARGET ${target} POST_BUILD
-    COMMAND ${CMAKE_COMMAND} -E make_directory "${dir}"
-    COMMAND ${CMAKE_COMMAND} -E create_symlink "${OVO_MESA_EGL}" "${dir}/libEGL_mali.so"
-    COMMAND ${CMAKE_COMMAND} -E create_symlink "${OVO_MESA_GLES1}" "${dir}/libGLESv1_CM_mali.so"
-    COMMAND ${CMAKE_COMMAND} -E create_symlink "${OVO_MESA_GLES2}" "${dir}/libGLESv2_mali.so"
-    VERBATIM)
+  ovo_link_vendor(${target} "${root}" "${OVO_MESA_EGL}" "${OVO_MESA_GLES1}" "${OVO_MESA_GLES2}")
 endfunction()
