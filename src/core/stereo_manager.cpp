@@ -49,8 +49,8 @@ StereoManager::StereoManager()
 }
 
 StereoManager::~StereoManager() {
-    if (m_layer != nullptr) delete m_layer;
-    if (m_profile != nullptr) delete m_profile;
+    delete m_layer;
+    delete m_profile;
     m_layer = nullptr;
     m_profile = nullptr;
     m_interleave = false;
@@ -66,7 +66,7 @@ GlLayer* StereoManager::CreateLayerForMode(StereoMode mode) {
 void StereoManager::InstallEs2Layer() {
     if (m_es2_layer_installed) return;
     m_es2_layer_installed = true;
-    if (m_layer != nullptr) delete m_layer;
+    delete m_layer;
     m_layer = new PassThroughLayer();
 }
 

@@ -8,11 +8,8 @@ extern "C" {
 OVO_EXPORT EGLSurface EGLAPIENTRY eglCreateWindowSurface(EGLDisplay dpy, EGLConfig config,
                                                          EGLNativeWindowType win,
                                                          const EGLint* attrib_list) {
+    // The overlay target is reset here, whatever the vendor answers, once it exists.
     return ovo::vendor_egl::eglCreateWindowSurface(dpy, config, win, attrib_list);
-}
-
-OVO_EXPORT EGLBoolean EGLAPIENTRY eglSwapBuffers(EGLDisplay dpy, EGLSurface surface) {
-    return ovo::vendor_egl::eglSwapBuffers(dpy, surface);
 }
 
 }  // extern "C"

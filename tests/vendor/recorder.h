@@ -37,6 +37,7 @@ struct RecorderState {
     RecordedCall m_calls[RECORDER_CAPACITY];
     // Knobs of the EGL library.
     bool m_make_current_fails;
+    bool m_swap_fails;
     EGLint m_surface_width;
     EGLint m_surface_height;
     EGLint m_chosen_attributes[RECORDER_ATTRIBUTE_CAPACITY];  // last eglChooseConfig list

@@ -53,6 +53,13 @@ struct Answer<ovo::EGL_ENTRY_eglMakeCurrent> {
 };
 
 template <>
+struct Answer<ovo::EGL_ENTRY_eglSwapBuffers> {
+    static EGLBoolean Give(EGLBoolean recorded, EGLDisplay, EGLSurface) {
+        return RecorderGetState()->m_swap_fails ? EGL_FALSE : recorded;
+    }
+};
+
+template <>
 struct Answer<ovo::EGL_ENTRY_eglQuerySurface> {
     static EGLBoolean Give(EGLBoolean recorded, EGLDisplay, EGLSurface, EGLint attribute,
                            EGLint* value) {

@@ -1,0 +1,35 @@
+#include "present/panel_control.h"
+
+#include <gtest/gtest.h>
+
+#include "support/device_files.h"
+
+namespace {
+
+TEST(PanelControlTest, EachModeReachesThePanelNodeByValue) {
+    device_files::Write("/dev/zpx", "");
+    EXPECT_TRUE(ovo::SetPanelMode(false, true));
+    EXPECT_TRUE(ovo::SetPanelMode(true, true));
+    EXPECT_TRUE(ovo::SetPanelMode(true, false));
+    EXPECT_EQ(device_files::Read("/dev/zpx"),
+              "request=0xc0047602 argument=0\n"
+              "request=0xc0047602 argument=1\n"
+              "request=0xc0047602 argument=2\n");
+}
+
+TEST(PanelControlTest, MissingNodesAreSilent) {
+    device_files::Remove("/dev/zpx");
+    device_files::Remove("/dev/zdriver");
+    EXPECT_FALSE(ovo::SetPanelMode(true, true));
+    ovo::SendCompositionStart();
+    EXPECT_FALSE(std::filesystem::exists(device_files::Path("/dev/zpx")));
+    EXPECT_FALSE(std::filesystem::exists(device_files::Path("/dev/zdriver")));
+}
+
+TEST(PanelControlTest, CompositionStartSendsOne) {
+    device_files::Write("/dev/zdriver", "");
+    ovo::SendCompositionStart();
+    EXPECT_EQ(device_files::Read("/dev/zdriver"), "request=0x616 argument=1\n");
+}
+
+}  // namespace

@@ -1,0 +1,136 @@
+// The per-frame work at eglSwapBuffers: the vendor's answer, the panel refresh on
+// processor time and the live-tuning file.
+#include <gtest/gtest.h>
+
+#include <ctime>
+#include <string>
+
+#include "core/stereo_manager.h"
+#include "present/live_tuning.h"
+#include "support/device_files.h"
+#include "support/egl_session.h"
+#include "support/forwarding_check.h"
+#include "support/vendor_root.h"
+
+namespace {
+
+// The refresh interval counts processor time, so the test spends some rather than sleep.
+void BurnProcessorTime(double seconds) {
+    clock_t start = clock();
+    volatile unsigned spins = 0;
+    while (static_cast<double>(clock() - start) < seconds * CLOCKS_PER_SEC) spins = spins + 1;
+}
+
+class SwapBuffersTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        vendor_root::InstallRecorder();
+        m_egl.Open();
+        ASSERT_NE(m_egl.m_display, EGL_NO_DISPLAY);
+        device_files::Write("/dev/zpx", "");
+        device_files::Remove("/sdcard/game_profile.txt");
+        Profile().m_shader_convert = true;
+        Profile().m_target_width = 800;
+        Profile().m_target_height = 480;
+    }
+
+    ovo::StereoProfile& Profile() { return *ovo::StereoManager::instance().m_profile; }
+    EGLBoolean Swap() { return eglSwapBuffers(m_egl.m_display, EglSession::Surface()); }
+    static std::string PanelRequests() { return device_files::Read("/dev/zpx"); }
+
+    EglSession m_egl;
+};
+
+const std::string LANDSCAPE = "request=0xc0047602 argument=1\n";
+const std::string PORTRAIT = "request=0xc0047602 argument=2\n";
+
+TEST_F(SwapBuffersTest, ThePanelIsReassertedAfterATenthOfASecondOfProcessorTime) {
+    Swap();
+    BurnProcessorTime(0.15);
+    EXPECT_EQ(PanelRequests(), "") << "the first swap only starts the interval";
+    Swap();
+    EXPECT_EQ(PanelRequests(), LANDSCAPE);
+    Swap();
+    Swap();
+    EXPECT_EQ(PanelRequests(), LANDSCAPE) << "the swap after a request starts a new interval";
+    BurnProcessorTime(0.15);
+    Swap();
+    EXPECT_EQ(PanelRequests(), LANDSCAPE + LANDSCAPE);
+}
+
+TEST_F(SwapBuffersTest, TheRequestFollowsTheTargetsOrientation) {
+    struct Case {
+        int32_t m_width;
+        int32_t m_height;
+        bool m_force_portrait;
+        std::string m_request;
+    } cases[] = {{800, 480, false, LANDSCAPE},
+                 {480, 800, false, PORTRAIT},
+                 {600, 600, false, LANDSCAPE},
+                 {800, 480, true, PORTRAIT}};
+    for (const Case& each : cases) {
+        device_files::Write("/dev/zpx", "");
+        device_files::Write("/sdcard/game_profile.txt", "0.02 1.5");
+        Profile().m_target_width = each.m_width;
+        Profile().m_target_height = each.m_height;
+        Profile().m_force_portrait = each.m_force_portrait;
+        Profile().m_eye_distance = 7.0f;
+        Swap();
+        BurnProcessorTime(0.15);
+        Swap();
+        EXPECT_EQ(PanelRequests(), each.m_request) << each.m_width << "x" << each.m_height;
+        // Forced portrait leaves the live-tuning file unread.
+        EXPECT_EQ(Profile().m_eye_distance, each.m_force_portrait ? 7.0f : 0.02f);
+    }
+}
+
+TEST_F(SwapBuffersTest, WithoutShaderConversionThePanelIsLeftAlone) {
+    Profile().m_shader_convert = false;
+    device_files::Write("/sdcard/game_profile.txt", "0.02 1.5");
+    Swap();
+    BurnProcessorTime(0.15);
+    Swap();
+    EXPECT_EQ(PanelRequests(), "");
+    EXPECT_EQ(Profile().m_eye_distance, 0.0f);
+}
+
+TEST_F(SwapBuffersTest, AFailedVendorSwapIsReportedAndTheRefreshStillRuns) {
+    RecorderGetState()->m_swap_fails = true;
+    EXPECT_EQ(Swap(), EGL_FALSE);
+    BurnProcessorTime(0.15);
+    EXPECT_EQ(Swap(), EGL_FALSE);
+    EXPECT_EQ(PanelRequests(), LANDSCAPE);
+    RecorderGetState()->m_swap_fails = false;
+    EXPECT_EQ(Swap(), (RecorderResult<EGLBoolean>(RECORDER_API_EGL, ovo::EGL_ENTRY_eglSwapBuffers)));
+}
+
+TEST_F(SwapBuffersTest, TheLiveTuningFileSetsFourParameters) {
+    struct Case {
+        const char* m_text;
+        float m_expected[4];
+    } cases[] = {
+        {"0.02 1.5", {0.02f, 1.5f, 0.0f, 0.0f}},
+        {"", {0.0f, 0.0f, 0.0f, 0.0f}},
+        {"1 2 3 4 5 6", {1.0f, 2.0f, 3.0f, 4.0f}},
+        {"0.5 x 3", {0.5f, 0.0f, 0.0f, 0.0f}},
+        {"garbage", {0.0f, 0.0f, 0.0f, 0.0f}},
+        {"-1e3\n\t2.5   -0.25\n8", {-1000.0f, 2.5f, -0.25f, 8.0f}},
+    };
+    ovo::StereoProfile& profile = Profile();
+    for (const Case& each : cases) {
+        profile.m_eye_distance = profile.m_eye_angle = profile.m_eye_shift = profile.m_ramp_steps = 9.0f;
+        device_files::Write("/sdcard/game_profile.txt", each.m_text);
+        ovo::ReadLiveTuning(profile);
+        const float got[4] = {profile.m_eye_distance, profile.m_eye_angle, profile.m_eye_shift,
+                              profile.m_ramp_steps};
+        for (int position = 0; position < 4; ++position) {
+            EXPECT_EQ(got[position], each.m_expected[position]) << '"' << each.m_text << '"';
+        }
+        EXPECT_EQ(profile.m_eye_distance_set, 0.0f) << "configured values stay";
+    }
+    device_files::Remove("/sdcard/game_profile.txt");
+    ovo::ReadLiveTuning(profile);
+    EXPECT_EQ(profile.m_eye_distance, -1000.0f) << "a missing file changes nothing";
+}
+
+}  // namespace
