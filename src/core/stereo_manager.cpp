@@ -6,6 +6,7 @@
 #include <cstdio>
 #include <cstring>
 
+#include "config/debug_config.h"
 #include "core/gl_layer.h"
 #include "platform/device_path.h"
 
@@ -35,6 +36,7 @@ StereoManager::StereoManager()
       m_depth_step(2.0f),
       m_depth_start(5.0f),
       m_process_name{},
+      m_debug(nullptr),
       m_profile(nullptr),
       m_layer(nullptr),
       m_frame_number(0),
@@ -44,14 +46,17 @@ StereoManager::StereoManager()
       m_interleave(false) {
     ReadProcessName(m_process_name);
     m_profile = new StereoProfile();
+    m_debug = new DebugConfig();
     m_layer = CreateLayerForMode(m_profile->ResolveMode());
     UpdateScale();
 }
 
 StereoManager::~StereoManager() {
     delete m_layer;
+    delete m_debug;
     delete m_profile;
     m_layer = nullptr;
+    m_debug = nullptr;
     m_profile = nullptr;
     m_interleave = false;
     m_es2_layer_installed = false;

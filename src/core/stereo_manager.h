@@ -9,6 +9,7 @@
 
 namespace ovo {
 
+class DebugConfig;
 class GlLayer;
 
 // A rectangle as glViewport and glScissor take it.
@@ -56,6 +57,7 @@ public:
     float m_depth_step;
     float m_depth_start;
     char m_process_name[PROCESS_NAME_CAPACITY];
+    DebugConfig* m_debug;
     StereoProfile* m_profile;
     GlLayer* m_layer;
     uint32_t m_frame_number;

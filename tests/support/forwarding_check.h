@@ -81,6 +81,7 @@ void ExpectForwarded(const char* name, uint32_t index, int32_t api, uint32_t ven
                      Result (*function)(Arguments...), std::index_sequence<POSITIONS...>) {
     std::tuple<Arguments...> arguments{
         Maker::template Make<Arguments>(index, static_cast<uint32_t>(POSITIONS))...};
+    static_cast<void>(index);  // unused by entry points without parameters
     ResetRecorder();
     if constexpr (std::is_void_v<Result>) {
         std::apply(function, arguments);
