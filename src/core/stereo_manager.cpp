@@ -18,12 +18,6 @@ constexpr char NO_PROCESS_NAME[] = "no.proc.name";
 bool IsWhitespace(char byte) { return (byte >= 9 && byte <= 13) || byte == ' '; }
 }  // namespace
 
-StereoManager& StereoManager::instance() {
-    // Thread-safe one-time construction; destroyed at process exit.
-    static StereoManager manager;
-    return manager;
-}
-
 StereoManager::StereoManager()
     : m_viewport{0, 0, 0, 0},
       m_scissor{0, 0, 0, 0},

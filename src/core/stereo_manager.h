@@ -26,8 +26,12 @@ constexpr size_t PROCESS_NAME_CAPACITY = 1024;
 // points, the layers and the EGL calls read and write them directly.
 class StereoManager {
 public:
-    // The single manager; the first call in the process builds it.
-    static StereoManager& instance();
+    // The single manager; the first call in the process builds it (thread-safe), and it
+    // is destroyed at process exit. Inline: every GL call starts here.
+    static StereoManager& instance() {
+        static StereoManager manager;
+        return manager;
+    }
 
     StereoManager();
     ~StereoManager();
