@@ -1,0 +1,55 @@
+#include "present/matrix_snapshot.h"
+
+#include "core/gl_api.h"
+#include "core/raw_gl.h"
+#include "present/matrix4.h"
+
+namespace ovo {
+
+uint32_t ClassifyProjection(const float projection[16]) {
+    if (projection[11] == 0.0f) return PROJECTION_FLAT;
+    if (projection[15] == 1.0f) return PROJECTION_FLAT;
+    return PROJECTION_PERSPECTIVE;
+}
+
+void MatrixSnapshot::Capture() {
+    Mat4Identity(m_projection);
+    Mat4Identity(m_modelview);
+    // GL's initial mode, in case the query answers nothing (no context bound).
+    m_matrix_mode = GL_MODELVIEW;
+    raw::glGetFloatv(GL_PROJECTION_MATRIX, m_projection);
+    raw::glGetFloatv(GL_MODELVIEW_MATRIX, m_modelview);
+    raw::glGetIntegerv(GL_MATRIX_MODE, &m_matrix_mode);
+}
+
+bool MatrixSnapshot::IsOverlayCandidate() const {
+    if (!Mat4IsIdentity(m_modelview)) return false;
+    GLint source = GL_ONE;
+    GLint destination = GL_ZERO;
+    const bool blending = raw::glIsEnabled(GL_BLEND) != GL_FALSE;
+    raw::glGetIntegerv(GL_BLEND_SRC, &source);
+    raw::glGetIntegerv(GL_BLEND_DST, &destination);
+    return !blending || (source == GL_SRC_ALPHA && destination == GL_ONE_MINUS_SRC_ALPHA);
+}
+
+void MatrixSnapshot::LoadShiftedProjection(const float t[3]) const {
+    raw::glMatrixMode(GL_PROJECTION);
+    raw::glLoadIdentity();
+    raw::glTranslatef(t[0], t[1], t[2]);
+    raw::glMultMatrixf(m_projection);
+}
+
+void MatrixSnapshot::LoadEyeProjection(const float t1[3], const float t2[3]) const {
+    LoadShiftedProjection(t2);
+    raw::glTranslatef(t1[0], t1[1], t1[2]);
+}
+
+void MatrixSnapshot::Restore() const {
+    raw::glMatrixMode(GL_PROJECTION);
+    raw::glLoadMatrixf(m_projection);
+    raw::glMatrixMode(GL_MODELVIEW);
+    raw::glLoadMatrixf(m_modelview);
+    raw::glMatrixMode(static_cast<GLenum>(m_matrix_mode));
+}
+
+}  // namespace ovo
