@@ -9,6 +9,7 @@
 #include "config/debug_config.h"
 #include "core/gl_layer.h"
 #include "platform/device_path.h"
+#include "present/viewer_tracker.h"
 
 namespace ovo {
 
@@ -33,6 +34,7 @@ StereoManager::StereoManager()
       m_debug(nullptr),
       m_profile(nullptr),
       m_layer(nullptr),
+      m_viewer(nullptr),
       m_frame_number(0),
       m_es2_layer_installed(false),
       m_scale_x(1.0f),
@@ -41,15 +43,18 @@ StereoManager::StereoManager()
     ReadProcessName(m_process_name);
     m_profile = new StereoProfile();
     m_debug = new DebugConfig();
+    m_viewer = new ViewerTracker(m_profile->m_auto_eye);
     m_layer = CreateLayerForMode(m_profile->ResolveMode());
     UpdateScale();
 }
 
 StereoManager::~StereoManager() {
     delete m_layer;
+    delete m_viewer;
     delete m_debug;
     delete m_profile;
     m_layer = nullptr;
+    m_viewer = nullptr;
     m_debug = nullptr;
     m_profile = nullptr;
     m_interleave = false;

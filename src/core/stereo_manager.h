@@ -11,6 +11,7 @@ namespace ovo {
 
 class DebugConfig;
 class GlLayer;
+class ViewerTracker;
 
 // A rectangle as glViewport and glScissor take it.
 struct GlRect {
@@ -64,6 +65,7 @@ public:
     DebugConfig* m_debug;
     StereoProfile* m_profile;
     GlLayer* m_layer;
+    ViewerTracker* m_viewer;
     uint32_t m_frame_number;
     bool m_es2_layer_installed;
     float m_scale_x;
