@@ -1,63 +1,79 @@
 #include "config/stereo_profile.h"
 
+#include <cstdio>
+#include <cstring>
+
+#include "platform/device_path.h"
+#include "platform/log.h"
+
 namespace ovo {
 
-StereoProfile::StereoProfile()
-    : m_width(0),
-      m_height(0),
-      m_enabled(false),
-      m_mode(0),
-      m_eye_distance(0.0f),
-      m_eye_shift(0.0f),
-      m_eye_angle(0.0f),
-      m_ramp_steps(0.0f),
-      m_eye_axis(STEREO_AXIS_X),
-      m_shift_axis(STEREO_AXIS_X),
-      m_ramp_param(STEREO_AXIS_X),
-      m_split(STEREO_SPLIT_SIDE_BY_SIDE),
-      m_eye_order(STEREO_EYE_ORDER_NORMAL),
-      m_ramp(STEREO_RAMP_OFF),
-      m_target_width(0),
-      m_target_height(0),
-      m_screen_width(0),
-      m_screen_height(0),
-      m_shader_convert(false),
-      m_use_screen_size(false),
-      m_auto_eye(false),
-      m_eye_target(false),
-      m_valid(false),
-      m_swap_eye_mask(true),
-      m_eye_shift_set(0.0f),
-      m_eye_distance_set(0.0f),
-      m_eye_angle_set(0.0f),
-      m_ramp_restart(10.0f),
-      m_force_portrait(false) {}
+namespace {
+constexpr const char SELF_COMMAND_LINE[] = "/proc/self/cmdline";
+}  // namespace
+
+StereoProfile::StereoProfile() : StereoProfileFields(), m_item_table{} {
+    // The fields hold their defaults (StereoProfileFields).
+    if (LoadProfile()) {
+        m_enabled = true;
+        ApplyScreenSize();
+    }
+    ApplyLiveWallpaperPreset(*this, DetectLiveWallpaper());
+}
 
 StereoProfile::~StereoProfile() { m_enabled = false; }
 
+bool StereoProfile::LoadProfile() {
+    LogPrint(LOG_PRIORITY_DEBUG, "[Duoscope] LoadPorfile");
+    std::memset(&m_item_table, 0, sizeof(m_item_table));
+
+    char path[DEVICE_PATH_CAPACITY];
+    if (!MakeDevicePath(PROFILE_PATH, path, sizeof(path))) return false;
+    FILE* file = std::fopen(path, "rb");
+    if (file == nullptr) return false;
+    ReadProfileTable(file, m_item_table);
+    std::fclose(file);
+
+    // One line per item read, with the count as the file gives it.
+    for (int index = 0; index < PROFILE_FILE_ITEMS; ++index) {
+        LogPrint(LOG_PRIORITY_ERROR, "item.m_data_count = %d", m_item_table.m_items[index].m_data_count);
+    }
+    if (m_item_table.m_validity == 0) return false;
+    ApplyProfileItems(*this, m_item_table);
+    return m_valid;
+}
+
 StereoMode StereoProfile::ResolveMode() {
     if (m_mode == 0) {
-        if (!m_enabled) {
-            m_mode = STEREO_MODE_OFF;
-        } else if (!m_shader_convert) {
-            m_mode = STEREO_MODE_PLAIN;
-        } else {
-            m_mode = STEREO_MODE_SHADER;
-        }
+        // The process name matters (and is read) only for an enabled shader profile.
+        char name[PROFILE_PROCESS_NAME_CAPACITY];
+        const bool named = m_enabled && m_shader_convert && ReadProcessName(name);
+        m_mode = ModeForProcess(*this, named ? name : nullptr);
     }
     return static_cast<StereoMode>(m_mode);
 }
 
 StereoMode StereoProfile::ApplyScreenSize() {
-    if (m_use_screen_size) {
-        m_width = m_screen_width;
-        m_height = m_screen_height;
-    } else {
-        m_width = m_target_width;
-        m_height = m_target_height;
-    }
+    SelectOutputSize(*this);
     m_mode = ResolveMode();
     return static_cast<StereoMode>(m_mode);
+}
+
+int StereoProfile::DetectLiveWallpaper() {
+    char name[PROFILE_PROCESS_NAME_CAPACITY];
+    if (!ReadProcessName(name)) return LIVE_WALLPAPER_NONE;
+    return LiveWallpaperKindOf(name);
+}
+
+bool StereoProfile::ReadProcessName(char* name) {
+    name[0] = '\0';
+    FILE* file = std::fopen(SELF_COMMAND_LINE, "r");
+    if (file == nullptr) return false;
+    // The last byte is kept for the terminator, so a long name is cut inside the buffer.
+    size_t length = std::fread(name, 1, PROFILE_PROCESS_NAME_CAPACITY - 1, file);
+    name[length] = '\0';
+    std::fclose(file);
+    return true;
 }
 
 }  // namespace ovo
