@@ -1,76 +1,106 @@
-#include "png_writer.h"
+#include "common/png_writer.h"
 
 #include <cstdio>
-#include <vector>
+
+namespace ovo_sample {
 
 namespace {
 
-uint32_t Crc32(const uint8_t* data, size_t size, uint32_t crc = 0) {
+constexpr uint8_t PNG_SIGNATURE[8] = {0x89, 'P', 'N', 'G', '\r', '\n', 0x1A, '\n'};
+constexpr uint8_t PNG_BIT_DEPTH = 8;
+constexpr uint8_t PNG_COLOR_RGB = 2;
+constexpr uint8_t PNG_FILTER_NONE = 0;
+constexpr size_t DEFLATE_STORED_MAX = 65535;
+constexpr uint32_t ADLER_MODULUS = 65521;
+
+uint32_t Crc32(const uint8_t* data, size_t size, uint32_t crc) {
     crc = ~crc;
     for (size_t i = 0; i < size; ++i) {
         crc ^= data[i];
-        for (int bit = 0; bit < 8; ++bit) crc = (crc >> 1) ^ (0xEDB88320u & (0u - (crc & 1u)));
+        for (int32_t bit = 0; bit < 8; ++bit) crc = (crc >> 1) ^ (0xEDB88320u & (0u - (crc & 1u)));
     }
     return ~crc;
 }
 
-void PutBigEndian(std::vector<uint8_t>& out, uint32_t value) {
-    for (int shift = 24; shift >= 0; shift -= 8) out.push_back(static_cast<uint8_t>(value >> shift));
+uint32_t Adler32(const std::vector<uint8_t>& data) {
+    uint32_t a = 1;
+    uint32_t b = 0;
+    for (uint8_t byte : data) {
+        a = (a + byte) % ADLER_MODULUS;
+        b = (b + a) % ADLER_MODULUS;
+    }
+    return (b << 16) | a;
 }
 
-void PutChunk(std::vector<uint8_t>& out, const char type[4], const std::vector<uint8_t>& body) {
-    PutBigEndian(out, static_cast<uint32_t>(body.size()));
-    size_t start = out.size();
-    out.insert(out.end(), type, type + 4);
-    out.insert(out.end(), body.begin(), body.end());
-    PutBigEndian(out, Crc32(out.data() + start, out.size() - start));
+void PutBigEndian32(std::vector<uint8_t>* out, uint32_t value) {
+    out->push_back(static_cast<uint8_t>(value >> 24));
+    out->push_back(static_cast<uint8_t>(value >> 16));
+    out->push_back(static_cast<uint8_t>(value >> 8));
+    out->push_back(static_cast<uint8_t>(value));
 }
 
-// A zlib stream of stored (uncompressed) deflate blocks: simple and deterministic.
-std::vector<uint8_t> StoredZlib(const std::vector<uint8_t>& data) {
+void PutChunk(std::vector<uint8_t>* out, const char type[4], const std::vector<uint8_t>& data) {
+    PutBigEndian32(out, static_cast<uint32_t>(data.size()));
+    const size_t type_start = out->size();
+    out->insert(out->end(), type, type + 4);
+    out->insert(out->end(), data.begin(), data.end());
+    // The CRC covers the type and the data, not the length.
+    PutBigEndian32(out, Crc32(out->data() + type_start, 4 + data.size(), 0));
+}
+
+// A zlib stream of stored deflate blocks.
+std::vector<uint8_t> StoreZlib(const std::vector<uint8_t>& raw) {
     std::vector<uint8_t> out = {0x78, 0x01};
     size_t offset = 0;
     do {
-        size_t length = data.size() - offset < 65535 ? data.size() - offset : 65535;
-        bool last = offset + length == data.size();
+        const size_t size = raw.size() - offset < DEFLATE_STORED_MAX ? raw.size() - offset
+                                                                     : DEFLATE_STORED_MAX;
+        const bool last = offset + size == raw.size();
         out.push_back(last ? 1 : 0);
-        out.push_back(static_cast<uint8_t>(length));
-        out.push_back(static_cast<uint8_t>(length >> 8));
-        out.push_back(static_cast<uint8_t>(~length));
-        out.push_back(static_cast<uint8_t>(~length >> 8));
-        out.insert(out.end(), data.begin() + offset, data.begin() + offset + length);
-        offset += length;
-    } while (offset < data.size());
-    uint32_t a = 1, b = 0;
-    for (uint8_t byte : data) {
-        a = (a + byte) % 65521;
-        b = (b + a) % 65521;
-    }
-    PutBigEndian(out, (b << 16) | a);
+        out.push_back(static_cast<uint8_t>(size));
+        out.push_back(static_cast<uint8_t>(size >> 8));
+        out.push_back(static_cast<uint8_t>(~size));
+        out.push_back(static_cast<uint8_t>(~size >> 8));
+        out.insert(out.end(), raw.begin() + offset, raw.begin() + offset + size);
+        offset += size;
+    } while (offset < raw.size());
+    PutBigEndian32(&out, Adler32(raw));
     return out;
 }
 
 }  // namespace
 
-bool WritePng(const char* path, int width, int height, const uint8_t* bottom_up_rgba) {
-    std::vector<uint8_t> rows;
-    size_t stride = static_cast<size_t>(width) * 4;
-    for (int row = height - 1; row >= 0; --row) {
-        rows.push_back(0);  // no filter
-        const uint8_t* pixels = bottom_up_rgba + static_cast<size_t>(row) * stride;
-        rows.insert(rows.end(), pixels, pixels + stride);
+std::vector<uint8_t> EncodePng(int32_t width, int32_t height, const uint8_t* rgba) {
+    const size_t pixel_count = static_cast<size_t>(width) * static_cast<size_t>(height);
+    std::vector<uint8_t> raw;
+    raw.reserve(pixel_count * 3 + static_cast<size_t>(height));
+    for (size_t i = 0; i < pixel_count; ++i) {
+        if (i % static_cast<size_t>(width) == 0) raw.push_back(PNG_FILTER_NONE);
+        raw.insert(raw.end(), rgba + i * 4, rgba + i * 4 + 3);
     }
-    std::vector<uint8_t> header;
-    PutBigEndian(header, static_cast<uint32_t>(width));
-    PutBigEndian(header, static_cast<uint32_t>(height));
-    header.insert(header.end(), {8, 6, 0, 0, 0});  // 8-bit RGBA, no interlace
-    std::vector<uint8_t> png = {0x89, 'P', 'N', 'G', '\r', '\n', 0x1A, '\n'};
-    PutChunk(png, "IHDR", header);
-    PutChunk(png, "IDAT", StoredZlib(rows));
-    PutChunk(png, "IEND", {});
 
+    std::vector<uint8_t> header;
+    PutBigEndian32(&header, static_cast<uint32_t>(width));
+    PutBigEndian32(&header, static_cast<uint32_t>(height));
+    header.push_back(PNG_BIT_DEPTH);
+    header.push_back(PNG_COLOR_RGB);
+    header.push_back(0);  // compression: deflate
+    header.push_back(0);  // filter method: adaptive
+    header.push_back(0);  // no interlace
+
+    std::vector<uint8_t> png(PNG_SIGNATURE, PNG_SIGNATURE + sizeof(PNG_SIGNATURE));
+    PutChunk(&png, "IHDR", header);
+    PutChunk(&png, "IDAT", StoreZlib(raw));
+    PutChunk(&png, "IEND", {});
+    return png;
+}
+
+bool WritePng(const char* path, int32_t width, int32_t height, const uint8_t* rgba) {
+    const std::vector<uint8_t> png = EncodePng(width, height, rgba);
     FILE* file = std::fopen(path, "wb");
     if (file == nullptr) return false;
-    bool written = std::fwrite(png.data(), 1, png.size(), file) == png.size();
+    const bool written = std::fwrite(png.data(), 1, png.size(), file) == png.size();
     return std::fclose(file) == 0 && written;
 }
+
+}  // namespace ovo_sample

@@ -1,117 +1,196 @@
-// An OpenGL ES 1.1 game scene: lit cubes and a floor under a perspective projection, then
-// a 2D HUD drawn with an orthographic projection, identity modelview and alpha blending.
-#include <GLES/gl.h>
+#include "es1_scene/es1_scene.h"
 
-#include "cube_mesh.h"
-#include "sample.h"
+#include <cmath>
+
+#include "common/gl_texture.h"
+#include "common/rgba_image.h"
+#include "es1_scene/cube_draw.h"
+
+namespace ovo_sample {
 
 namespace {
 
-struct Scene {
-    float m_cube[CUBE_VERTEX_COUNT * CUBE_VERTEX_FLOATS];
-    uint16_t m_indices[CUBE_INDEX_COUNT];
-    int m_width, m_height;
-} scene;
+constexpr float PI = 3.14159265358979f;
+constexpr GLfloat VIEW_NEAR = 1.0f;
+constexpr GLfloat VIEW_FAR = 60.0f;
+constexpr float VIEW_FOVY_DEGREES = 50.0f;
+constexpr GLfloat CAMERA_PITCH = 16.0f;
+constexpr GLfloat CAMERA_HEIGHT = 3.2f;
+constexpr GLfloat CAMERA_DISTANCE = 9.0f;
 
-bool SetUp(int width, int height) {
-    scene.m_width = width;
-    scene.m_height = height;
-    BuildCube(scene.m_cube, scene.m_indices);
-    glEnable(GL_LIGHT0);
-    const GLfloat direction[4] = {0.4f, 0.8f, 0.5f, 0.0f};
-    glLightfv(GL_LIGHT0, GL_POSITION, direction);
-    glShadeModel(GL_SMOOTH);
-    return true;
-}
+constexpr int32_t FLOOR_TILES = 12;
+constexpr GLfloat FLOOR_TILE_SIZE = 2.0f;
+constexpr int32_t CRATE_TEXTURE_SIZE = 64;
+constexpr int32_t CRATE_CHECKER_CELL = 16;
 
-void DrawCube(float x, float y, float z, float angle, const GLfloat color[4]) {
-    glPushMatrix();
-    glTranslatef(x, y, z);
-    glRotatef(angle, 0, 1, 0);
-    glRotatef(15, 1, 0, 0);
-    glMaterialfv(GL_FRONT_AND_BACK, GL_AMBIENT_AND_DIFFUSE, color);
-    const GLsizei stride = CUBE_VERTEX_FLOATS * sizeof(float);
-    glVertexPointer(3, GL_FLOAT, stride, scene.m_cube);
-    glNormalPointer(GL_FLOAT, stride, scene.m_cube + 3);
-    glDrawElements(GL_TRIANGLES, CUBE_INDEX_COUNT, GL_UNSIGNED_SHORT, scene.m_indices);
-    glPopMatrix();
-}
+constexpr GLfloat SKY[4] = {0.55f, 0.70f, 0.85f, 1.0f};
+constexpr GLfloat FOG_START = 10.0f;
+constexpr GLfloat FOG_END = 32.0f;
+// Directional (w = 0), towards the light.
+constexpr GLfloat LIGHT_DIRECTION[4] = {0.4f, 0.8f, 0.45f, 0.0f};
+constexpr GLfloat LIGHT_AMBIENT[4] = {0.3f, 0.3f, 0.3f, 1.0f};
+constexpr GLfloat LIGHT_DIFFUSE[4] = {0.8f, 0.8f, 0.8f, 1.0f};
 
-void DrawWorld(int frame) {
-    glMatrixMode(GL_PROJECTION);
-    glLoadIdentity();
-    float aspect = static_cast<float>(scene.m_width) / static_cast<float>(scene.m_height);
-    glFrustumf(-0.5f * aspect, 0.5f * aspect, -0.5f, 0.5f, 1.0f, 60.0f);
-    glMatrixMode(GL_MODELVIEW);
-    glLoadIdentity();
-    glTranslatef(0, -1.5f, -6);
-    glRotatef(15, 1, 0, 0);
+struct Crate {
+    GLfloat m_position[3];
+    GLfloat m_size;
+    GLfloat m_yaw;
+    GLfloat m_spin;  // degrees per frame
+    GLfloat m_color[3];
+};
 
-    glEnable(GL_DEPTH_TEST);
-    glEnable(GL_CULL_FACE);
-    glEnable(GL_LIGHTING);
-    glEnableClientState(GL_VERTEX_ARRAY);
-    glEnableClientState(GL_NORMAL_ARRAY);
-
-    const GLfloat floor_color[4] = {0.45f, 0.4f, 0.3f, 1};
-    glMaterialfv(GL_FRONT_AND_BACK, GL_AMBIENT_AND_DIFFUSE, floor_color);
-    const GLfloat floor[] = {-10, 0, 10, 10, 0, 10, -10, 0, -30, 10, 0, -30};
-    const GLfloat up[] = {0, 1, 0, 0, 1, 0, 0, 1, 0, 0, 1, 0};
-    glVertexPointer(3, GL_FLOAT, 0, floor);
-    glNormalPointer(GL_FLOAT, 0, up);
-    glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
-
-    const GLfloat orange[4] = {0.95f, 0.55f, 0.1f, 1};
-    const GLfloat teal[4] = {0.1f, 0.7f, 0.65f, 1};
-    const GLfloat violet[4] = {0.6f, 0.3f, 0.85f, 1};
-    float spin = 12.0f * frame;
-    DrawCube(-1.8f, 0.5f, 1.0f, 30 + spin, orange);
-    DrawCube(0.6f, 0.5f, -2.0f, -20, teal);
-    DrawCube(3.0f, 0.5f, -8.0f, 45 - spin, violet);
-
-    glDisableClientState(GL_NORMAL_ARRAY);
-    glDisable(GL_LIGHTING);
-    glDisable(GL_CULL_FACE);
-}
-
-void DrawQuad(float x, float y, float width, float height) {
-    const GLfloat corners[] = {x, y, x + width, y, x, y + height, x + width, y + height};
-    glVertexPointer(2, GL_FLOAT, 0, corners);
-    glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
-}
-
-// The HUD, in pixels: a translucent panel with a health bar and a score strip.
-void DrawHud(int frame) {
-    glMatrixMode(GL_PROJECTION);
-    glLoadIdentity();
-    glOrthof(0, static_cast<float>(scene.m_width), 0, static_cast<float>(scene.m_height), -1, 1);
-    glMatrixMode(GL_MODELVIEW);
-    glLoadIdentity();
-    glDisable(GL_DEPTH_TEST);
-    glEnable(GL_BLEND);
-    glBlendFunc(GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
-
-    glColor4f(0.05f, 0.05f, 0.1f, 0.6f);
-    DrawQuad(8, 8, 140, 40);
-    glColor4f(0.9f, 0.15f, 0.15f, 0.85f);
-    DrawQuad(16, 30, 100.0f - 10.0f * frame, 10);
-    glColor4f(0.2f, 0.8f, 0.3f, 0.85f);
-    DrawQuad(16, 16, 124, 8);
-    glColor4f(1, 1, 1, 0.4f);
-    DrawQuad(static_cast<float>(scene.m_width) - 72, static_cast<float>(scene.m_height) - 28, 64, 20);
-    glColor4f(1, 1, 1, 1);
-    glDisable(GL_BLEND);
-}
-
-void DrawFrame(int frame) {
-    glViewport(0, 0, scene.m_width, scene.m_height);
-    glClearColor(0.5f, 0.7f, 0.95f, 1);
-    glClear(GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT);
-    DrawWorld(frame);
-    DrawHud(frame);
-    glDisableClientState(GL_VERTEX_ARRAY);
-}
+constexpr Crate CRATES[] = {
+    {{-2.8f, 0.7f, 1.5f}, 0.7f, 20.0f, 12.0f, {0.9f, 0.25f, 0.2f}},
+    {{3.0f, 0.5f, 2.5f}, 0.5f, -30.0f, -20.0f, {0.25f, 0.45f, 0.95f}},
+    {{-4.5f, 1.2f, -6.0f}, 1.2f, 45.0f, 0.0f, {0.95f, 0.8f, 0.25f}},
+    {{5.5f, 1.5f, -12.0f}, 1.5f, 10.0f, 0.0f, {0.6f, 0.3f, 0.8f}},
+};
 
 }  // namespace
 
-const Sample SAMPLE = {"es1_scene", 1, SetUp, DrawFrame};
+bool Es1Scene::Init(const char* /*program*/, int32_t width, int32_t height) {
+    m_width = width;
+    m_height = height;
+    BuildFloor();
+    const RgbaImage crate = MakeCheckerboard(CRATE_TEXTURE_SIZE, CRATE_CHECKER_CELL,
+                                             {200, 150, 90, 255}, {130, 85, 45, 255});
+    m_crate_texture = CreateTexture(crate, {GL_LINEAR, GL_LINEAR, GL_REPEAT, GL_REPEAT});
+    m_hud.Init(width, height);
+    return true;
+}
+
+void Es1Scene::Release() {
+    m_hud.Release();
+    DeleteTexture(&m_crate_texture);
+}
+
+void Es1Scene::BuildFloor() {
+    const GLfloat origin = -FLOOR_TILES * FLOOR_TILE_SIZE * 0.5f;
+    for (int32_t row = 0; row < FLOOR_TILES; ++row) {
+        for (int32_t column = 0; column < FLOOR_TILES; ++column) {
+            const GLfloat x0 = origin + column * FLOOR_TILE_SIZE;
+            const GLfloat z0 = origin + row * FLOOR_TILE_SIZE;
+            const GLfloat x1 = x0 + FLOOR_TILE_SIZE;
+            const GLfloat z1 = z0 + FLOOR_TILE_SIZE;
+            const bool light = ((row + column) & 1) != 0;
+            const GLubyte near_green = light ? 120 : 85;
+            const GLubyte far_green = light ? 160 : 115;
+            const GLubyte n[4] = {40, near_green, 35, 255};
+            const GLubyte f[4] = {60, far_green, 45, 255};
+            // Counter-clockwise seen from above.
+            const FloorVertex tile[6] = {
+                {{x0, 0, z1}, {n[0], n[1], n[2], n[3]}}, {{x1, 0, z1}, {n[0], n[1], n[2], n[3]}},
+                {{x1, 0, z0}, {f[0], f[1], f[2], f[3]}}, {{x0, 0, z1}, {n[0], n[1], n[2], n[3]}},
+                {{x1, 0, z0}, {f[0], f[1], f[2], f[3]}}, {{x0, 0, z0}, {f[0], f[1], f[2], f[3]}},
+            };
+            m_floor.insert(m_floor.end(), tile, tile + 6);
+        }
+    }
+}
+
+void Es1Scene::DrawFrame(int32_t frame) {
+    glViewport(0, 0, m_width, m_height);
+    glClearColor(SKY[0], SKY[1], SKY[2], SKY[3]);
+    glClear(GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT);
+
+    SetUpPerspective();
+    glEnable(GL_DEPTH_TEST);
+    glDepthFunc(GL_LEQUAL);
+    glEnable(GL_CULL_FACE);
+    glShadeModel(GL_SMOOTH);
+    glEnable(GL_FOG);
+    glFogf(GL_FOG_MODE, GL_LINEAR);
+    glFogf(GL_FOG_START, FOG_START);
+    glFogf(GL_FOG_END, FOG_END);
+    glFogfv(GL_FOG_COLOR, SKY);
+
+    DrawFloor();
+    DrawCrates(frame);
+    DrawTower(frame);
+
+    m_hud.Draw(frame);
+}
+
+void Es1Scene::SetUpPerspective() const {
+    const GLfloat top = VIEW_NEAR * std::tan(VIEW_FOVY_DEGREES * 0.5f * PI / 180.0f);
+    const GLfloat right = top * m_width / m_height;
+    glMatrixMode(GL_PROJECTION);
+    glLoadIdentity();
+    glFrustumf(-right, right, -top, top, VIEW_NEAR, VIEW_FAR);
+
+    glMatrixMode(GL_MODELVIEW);
+    glLoadIdentity();
+    glRotatef(CAMERA_PITCH, 1.0f, 0.0f, 0.0f);
+    glTranslatef(0.0f, -CAMERA_HEIGHT, -CAMERA_DISTANCE);
+    // Set after the camera so the light stays fixed in the world.
+    glLightfv(GL_LIGHT0, GL_POSITION, LIGHT_DIRECTION);
+}
+
+void Es1Scene::DrawFloor() const {
+    glDisable(GL_LIGHTING);
+    glEnableClientState(GL_VERTEX_ARRAY);
+    glEnableClientState(GL_COLOR_ARRAY);
+    glVertexPointer(3, GL_FLOAT, sizeof(FloorVertex), m_floor[0].m_position);
+    glColorPointer(4, GL_UNSIGNED_BYTE, sizeof(FloorVertex), m_floor[0].m_color);
+    glDrawArrays(GL_TRIANGLES, 0, static_cast<GLsizei>(m_floor.size()));
+    glDisableClientState(GL_COLOR_ARRAY);
+    glDisableClientState(GL_VERTEX_ARRAY);
+}
+
+void Es1Scene::DrawCrates(int32_t frame) const {
+    glEnable(GL_LIGHTING);
+    glEnable(GL_LIGHT0);
+    glLightfv(GL_LIGHT0, GL_AMBIENT, LIGHT_AMBIENT);
+    glLightfv(GL_LIGHT0, GL_DIFFUSE, LIGHT_DIFFUSE);
+    glEnable(GL_COLOR_MATERIAL);
+    // Scaled cubes have scaled normals.
+    glEnable(GL_NORMALIZE);
+
+    for (const Crate& crate : CRATES) {
+        glPushMatrix();
+        glTranslatef(crate.m_position[0], crate.m_position[1], crate.m_position[2]);
+        glRotatef(crate.m_yaw + crate.m_spin * frame, 0.0f, 1.0f, 0.0f);
+        glScalef(crate.m_size, crate.m_size, crate.m_size);
+        glColor4f(crate.m_color[0], crate.m_color[1], crate.m_color[2], 1.0f);
+        DrawCube(false);
+        glPopMatrix();
+    }
+
+    // A wooden crate: the lit colour modulates the texture.
+    glEnable(GL_TEXTURE_2D);
+    glBindTexture(GL_TEXTURE_2D, m_crate_texture);
+    glTexEnvf(GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, GL_MODULATE);
+    glColor4f(1.0f, 1.0f, 1.0f, 1.0f);
+    glPushMatrix();
+    glTranslatef(1.1f, 0.8f, 1.0f);
+    glRotatef(-25.0f + 8.0f * frame, 0.0f, 1.0f, 0.0f);
+    glScalef(0.8f, 0.8f, 0.8f);
+    DrawCube(true);
+    glPopMatrix();
+    glDisable(GL_TEXTURE_2D);
+}
+
+void Es1Scene::DrawTower(int32_t frame) const {
+    // Each block sits on the one below and turns relative to it, as a game's jointed
+    // models do on the matrix stack.
+    const GLfloat colors[3][3] = {{0.8f, 0.8f, 0.8f}, {0.3f, 0.8f, 0.5f}, {0.9f, 0.5f, 0.2f}};
+    glPushMatrix();
+    glTranslatef(-1.0f, 0.0f, -3.5f);
+    for (int32_t level = 0; level < 3; ++level) {
+        const GLfloat size = 0.9f - 0.2f * level;
+        glTranslatef(0.0f, size, 0.0f);
+        glRotatef(15.0f + 10.0f * frame, 0.0f, 1.0f, 0.0f);
+        glPushMatrix();
+        glScalef(size, size, size);
+        glColor4f(colors[level][0], colors[level][1], colors[level][2], 1.0f);
+        DrawCube(false);
+        glPopMatrix();
+        glTranslatef(0.0f, size, 0.0f);
+    }
+    glPopMatrix();
+    glDisable(GL_NORMALIZE);
+    glDisable(GL_COLOR_MATERIAL);
+    glDisable(GL_LIGHTING);
+}
+
+}  // namespace ovo_sample

@@ -1,0 +1,43 @@
+#ifndef OVO_EXAMPLES_ES2_SCENE_ES2_SCENE_H
+#define OVO_EXAMPLES_ES2_SCENE_ES2_SCENE_H
+
+#include <GLES2/gl2.h>
+
+#include "common/sample_scene.h"
+#include "es2_scene/mat4.h"
+#include "es2_scene/render_target.h"
+#include "es2_scene/scene_meshes.h"
+#include "es2_scene/scene_programs.h"
+
+namespace ovo_sample {
+
+// A small 3D level: a checkered floor, lit crates at several depths, a pyramid, a glass
+// pane, a crate showing a picture rendered to a texture this frame, and a HUD on top.
+class Es2Scene : public SampleScene {
+public:
+    bool Init(const char* program, int32_t width, int32_t height) override;
+    void DrawFrame(int32_t frame) override;
+    void Release() override;
+
+private:
+    void DrawMonitorPicture(int32_t frame);
+    void DrawWorld(int32_t frame);
+    void DrawHud();
+
+    void DrawLitCube(const Mat4& view_projection, const Mat4& model, const float color[4]);
+    void DrawTexturedCube(const Mat4& mvp, GLuint texture);
+    void DrawGround(const Mat4& view_projection);
+    void DrawPyramid(const Mat4& view_projection, const Mat4& model);
+    void DrawFlatQuad(const Mat4& mvp, const float color[4]);
+
+    ScenePrograms m_programs;
+    SceneMeshes m_meshes;
+    RenderTarget m_monitor;
+    uint32_t m_floor_texture = 0;
+    int32_t m_width = 0;
+    int32_t m_height = 0;
+};
+
+}  // namespace ovo_sample
+
+#endif
