@@ -11,7 +11,8 @@ export EGL_PLATFORM=surfaceless
 status=0
 for program in "$build"/examples/*_ovo; do
   sample="$(basename "$program" _ovo)"
-  "$program" "$out/$sample.png" >/dev/null
+  # The library's Android log lines (standard error on a host) go to a file of their own.
+  "$program" "$out/$sample.png" >/dev/null 2>"$out/$sample.log"
   "$build/examples/${sample}_mesa" "$out/${sample}_mesa.png" >/dev/null
   if cmp -s "$out/$sample.png" "$out/${sample}_mesa.png"; then
     echo "$sample: out/demo/$sample.png (identical to Mesa's own rendering)"
