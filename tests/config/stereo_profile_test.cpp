@@ -1,369 +1,297 @@
-// StereoProfile as the manager builds it: the profile file below the device root, the
-// mode by process name (each name in a process of its own, started under that name), and
-// the live-wallpaper presets.
+// The stereo profile in the library: the file format (hostile counts, types, truncation),
+// what the items set, the mode by process name, and the live-wallpaper presets.
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdio>
-#include <cstdlib>
 #include <cstring>
+#include <sstream>
 #include <string>
+#include <utility>
 #include <vector>
 
+#include "config/profile_file.h"
 #include "config/stereo_profile.h"
-#include "profile_test_bytes.h"
+#include "support/device_files.h"
 #include "support/scenario_process.h"
 
 namespace {
 
-using namespace profile_bytes;
+// Files are built byte by byte (big-endian), independently of the library's writer.
+std::string Be32(uint32_t value) { return {char(value >> 24), char(value >> 16), char(value >> 8), char(value)}; }
 
-const std::string ENABLED_SHADER = Flag(0x2301, true) + Flag(0x2403, true);
+// One item exactly as given (the count may be negative or disagree with the payload).
+std::string Item(uint32_t id, int type, int count, const std::string& payload = "") {
+    return Be32(id) + Be32(uint32_t(type & 0xFFFF) << 16 | uint32_t(count & 0xFFFF)) + payload;
+}
+
+std::string Words(uint32_t id, std::initializer_list<uint32_t> values, int type = 0x1003) {
+    std::string payload;
+    for (uint32_t value : values) payload += Be32(value);
+    return Item(id, type, int(values.size()), payload);
+}
+
+std::string Float(uint32_t id, float value) {
+    uint32_t bits;
+    std::memcpy(&bits, &value, sizeof(bits));
+    return Words(id, {bits});
+}
+
+std::string File(std::vector<std::string> items, uint32_t validity = 1) {
+    std::string bytes = Be32(0) + Be32(validity) + Be32(0) + Be32(0);
+    items.resize(std::max<size_t>(items.size(), 24), Item(0, 0, 0));
+    for (const std::string& item : items) bytes += item;
+    return bytes;
+}
+
+const std::string ENABLED_SHADER = Words(0x2301, {1}) + Words(0x2403, {1});
+constexpr size_t HEADS = 16 + 24 * 8;  // a file of items without payload
+
+// All the fields on one line, so that a check can name just the parts it cares about.
+std::string Describe(const ovo::StereoProfileFields& f) {
+    char line[640];
+    std::snprintf(line, sizeof(line),
+                  "enabled=%d mode=0x%X size=%dx%d distance=%g shift=%g angle=%g steps=%g restart=%g distance_set=%g "
+                  "shift_set=%g angle_set=%g target=%dx%d screen=%dx%d axis=0x%X shift_axis=0x%X ramp_param=0x%X "
+                  "split=0x%X order=0x%X ramp=0x%X flags=%d%d%d%d%d%d%d",
+                  f.m_enabled, f.m_mode, f.m_width, f.m_height, double(f.m_eye_distance), double(f.m_eye_shift),
+                  double(f.m_eye_angle), double(f.m_ramp_steps), double(f.m_ramp_restart),
+                  double(f.m_eye_distance_set), double(f.m_eye_shift_set), double(f.m_eye_angle_set),
+                  f.m_target_width, f.m_target_height, f.m_screen_width, f.m_screen_height, f.m_eye_axis,
+                  f.m_shift_axis, f.m_ramp_param, f.m_split, f.m_eye_order, f.m_ramp, f.m_shader_convert,
+                  f.m_use_screen_size, f.m_auto_eye, f.m_eye_target, f.m_valid, f.m_swap_eye_mask, f.m_force_portrait);
+    return line;
+}
+
+bool Has(const std::string& line, const std::string& parts) {
+    std::istringstream words(parts);
+    for (std::string part; words >> part;)
+        if ((" " + line + " ").find(" " + part + " ") == std::string::npos) return false;
+    return true;
+}
+
+TEST(ProfileFileTest, ReaderAndWriterCases) {
+    std::string words_40;
+    for (uint32_t value = 0; value < 40; ++value) words_40 += Be32(value + 100);
+    static const std::string bytes_200 = [] { std::string b; for (int v = 0; v < 200; ++v) b += char(v); return b; }();
+    // An oversized item in slot 0 shows where the next item is read from; one in the last
+    // slot shows whether it spills into slot 24.
+    const auto oversized = [&](bool words_first) {
+        std::vector<std::string> items(24, Item(0, 0, 0));
+        items[words_first ? 0 : 23] = Item(0x2303, 0x1003, 40, words_40);
+        items[words_first ? 23 : 0] = Item(0x2501, 0x1005, 200, bytes_200);
+        items[1] = Words(0x2102, {0x3107});
+        return File(items);
+    };
+    using T = const ovo::ProfileTable&;
+    const struct {
+        const char* m_name;
+        std::string m_bytes;
+        int m_complete_items;
+        size_t m_consumed;
+        bool m_out_of_range;
+        bool (*m_check)(T);
+    } cases[] = {
+        {"header words; other header bytes kept (by the write-back); 0x1004 like 0x1003; 5 text bytes take 5",
+         "\x01\x02\x03\x04" + Be32(0x11223344) + Be32(0xA0B0C0D0) + "\x05\x06\x07\x08" +
+             File({Item(0x2001, 0x1003, 1, "\xBD\x0F\x5C\x29"), Words(0x2201, {640, 720}, 0x1004),
+                   Item(0x2501, 0x1005, 5, std::string("abcd\0", 5)), Words(0x2101, {0x3102}),
+                   Item(0x7777, 0x0042, -9)}).substr(16),
+         24, HEADS + 4 + 8 + 5 + 4, false,
+         [](T t) {
+             return t.m_validity == 0x11223344 && t.m_header_word == 0xA0B0C0D0 &&
+                    t.m_items[0].m_data[0] == 0xBD0F5C29 && t.m_items[1].m_data[1] == 720 &&
+                    std::memcmp(t.m_items[2].m_data, "abcd", 5) == 0 && t.m_items[3].m_data[0] == 0x3102;
+         }},
+        {"40 words keep 32 and skip the rest; 128 of 200 text bytes stay in the last slot", oversized(true), 24,
+         HEADS + 160 + 4 + 200, true, [](T t) {
+             return t.m_items[0].m_data_count == 40 && t.m_items[0].m_data[31] == 131 &&
+                    t.m_items[1].m_data[0] == 0x3107 && t.m_items[24].m_id == 0 &&
+                    std::memcmp(t.m_items[23].m_data, bytes_200.data(), 128) == 0;
+         }},
+        {"200 text bytes keep 128 and skip the rest; 32 of 40 words stay in the last slot", oversized(false), 24,
+         HEADS + 160 + 4 + 200, true, [](T t) {
+             return std::memcmp(t.m_items[0].m_data, bytes_200.data(), 128) == 0 && t.m_items[1].m_data[0] == 0x3107 &&
+                    t.m_items[23].m_data[31] == 131 && t.m_items[24].m_id == 0;
+         }},
+        {"negative counts and an unknown type read no payload",
+         File({Item(0x2001, 0x1003, -1), Item(0x2501, 0x1005, -32768), Item(0x2002, 0x0042, 3), Words(0x2003, {7})}),
+         24, HEADS + 4, true, [](T t) { return t.m_items[0].m_data[0] == 0 && t.m_items[3].m_data[0] == 7; }},
+        {"a count of 32767 words stops at the end of the data, inside a word",
+         File({}).substr(0, 16) + Item(0x2001, 0x1003, 32767, Be32(5) + Be32(7) + std::string("\0\x09", 2)), 0,
+         16 + 8 + 10, true, [](T t) { return t.m_items[0].m_data[1] == 7 && t.m_items[0].m_data[2] == 0; }},
+        {"a count of 40 words, the data ends inside the part that is skipped",
+         File({}).substr(0, 16) + Item(0x2303, 0x1003, 40, words_40.substr(0, 33 * 4 + 2)), 0, 16 + 8 + 134, true,
+         [](T t) { return t.m_items[0].m_data[31] == 131; }},
+        {"a file ending inside a head keeps the numbers that arrived whole",
+         File({Words(0x2403, {1}), Be32(0x2101) + "\x10\x03"}).substr(0, 16 + 12 + 6), 1, 16 + 12 + 6, false,
+         [](T t) {
+             return t.m_items[1].m_id == 0x2101 && t.m_items[1].m_data_type == 0x1003 && t.m_items[1].m_data_count == 0;
+         }},
+        {"8 bytes of header bring the validity word", File({}, 7).substr(0, 8), 0, 8, false,
+         [](T t) { return t.m_validity == 7; }},
+        {"an empty file leaves the table clear", "", 0, 0, false,
+         [](T t) { return t.m_validity == 0 && t.m_items[0].m_id == 0; }},
+        {"bytes after the 24th item are not read", File({}) + Words(0x2403, {1}), 24, HEADS, false,
+         [](T t) { return t.m_items[24].m_id == 0; }},
+    };
+    for (const auto& each : cases) {
+        SCOPED_TRACE(each.m_name);
+        // The library reads a stream, the fuzz targets memory; dirty tables show what a read fails to clear.
+        ovo::ProfileTable table, from_memory;
+        std::memset(&table, 0xAB, sizeof(table));
+        std::memset(&from_memory, 0xCD, sizeof(from_memory));
+        FILE* file = std::tmpfile();
+        std::fwrite(each.m_bytes.data(), 1, each.m_bytes.size(), file);
+        std::rewind(file);
+        const auto result = ovo::ReadProfileTable(file, table);
+        std::fclose(file);
+        const auto* data = reinterpret_cast<const uint8_t*>(each.m_bytes.data());
+        EXPECT_EQ(ovo::ReadProfileTable(data, each.m_bytes.size(), from_memory).m_bytes_consumed, each.m_consumed);
+        EXPECT_EQ(std::memcmp(&table, &from_memory, sizeof(table)), 0) << "the readers differ";
+        EXPECT_TRUE(each.m_check(table));
+        EXPECT_EQ(result.m_complete_items, each.m_complete_items);
+        EXPECT_EQ(result.m_bytes_consumed, each.m_consumed);
+        EXPECT_EQ(result.m_count_out_of_range, each.m_out_of_range);
+
+        // The writer refuses counts that overflow a slot and needs exactly the bytes it writes.
+        uint8_t written[ovo::PROFILE_FILE_CAPACITY];
+        const size_t size = result.m_bytes_consumed;
+        if (result.m_count_out_of_range) {
+            EXPECT_EQ(ovo::WriteProfileTable(table, written, sizeof(written)), 0u);
+        } else if (!result.m_truncated) {
+            EXPECT_EQ(ovo::WriteProfileTable(table, written, size), size);
+            EXPECT_EQ(std::string(reinterpret_cast<const char*>(written), size), each.m_bytes.substr(0, size));
+            EXPECT_EQ(ovo::WriteProfileTable(table, written, size - 1), 0u);
+        }
+    }
+}
 
 class StereoProfileTest : public ::testing::Test {
 protected:
-    void SetUp() override { Uninstall(); }
-    void TearDown() override { Uninstall(); }
+    void TearDown() override { device_files::Remove(ovo::PROFILE_PATH); }
+    void Install(const std::string& bytes) {
+        device_files::Remove(ovo::PROFILE_PATH);
+        if (!bytes.empty()) device_files::Write(ovo::PROFILE_PATH, bytes);
+    }
 };
 
-void ExpectDefaults(const ovo::StereoProfile& profile) {
-    EXPECT_EQ(profile.m_width, 0);
-    EXPECT_EQ(profile.m_height, 0);
-    EXPECT_FALSE(profile.m_enabled);
-    EXPECT_EQ(profile.m_eye_distance, 0.0f);
-    EXPECT_EQ(profile.m_eye_shift, 0.0f);
-    EXPECT_EQ(profile.m_eye_angle, 0.0f);
-    EXPECT_EQ(profile.m_ramp_steps, 0.0f);
-    EXPECT_EQ(profile.m_eye_axis, ovo::STEREO_AXIS_X);
-    EXPECT_EQ(profile.m_shift_axis, ovo::STEREO_AXIS_X);
-    EXPECT_EQ(profile.m_ramp_param, ovo::STEREO_AXIS_X);
-    EXPECT_EQ(profile.m_split, ovo::STEREO_SPLIT_SIDE_BY_SIDE);
-    EXPECT_EQ(profile.m_eye_order, ovo::STEREO_EYE_ORDER_NORMAL);
-    EXPECT_EQ(profile.m_ramp, ovo::STEREO_RAMP_OFF);
-    EXPECT_EQ(profile.m_target_width, 0);
-    EXPECT_EQ(profile.m_target_height, 0);
-    EXPECT_EQ(profile.m_screen_width, 0);
-    EXPECT_EQ(profile.m_screen_height, 0);
-    EXPECT_FALSE(profile.m_shader_convert);
-    EXPECT_FALSE(profile.m_use_screen_size);
-    EXPECT_FALSE(profile.m_auto_eye);
-    EXPECT_FALSE(profile.m_eye_target);
-    EXPECT_FALSE(profile.m_valid);
-    EXPECT_TRUE(profile.m_swap_eye_mask);
-    EXPECT_EQ(profile.m_eye_shift_set, 0.0f);
-    EXPECT_EQ(profile.m_eye_distance_set, 0.0f);
-    EXPECT_EQ(profile.m_eye_angle_set, 0.0f);
-    EXPECT_EQ(profile.m_ramp_restart, 10.0f);
-    EXPECT_FALSE(profile.m_force_portrait);
+TEST_F(StereoProfileTest, TheFileDecidesTheFieldsAndTheMode) {
+    // Every id once (the later split wins; the valid flag arrives as text: the id decides).
+    std::vector<std::string> items = {
+        Float(0x2001, -0.035f), Float(0x2002, 0.01f), Float(0x2003, -0.05f), Float(0x2004, 2.0f),
+        Words(0x2005, {0x3002}), Words(0x2006, {0x3003}), Words(0x2101, {0x3101}), Words(0x2102, {0x3107}),
+        Words(0x2111, {0x3202}), Words(0x2201, {800, 480}), Words(0x2202, {1024, 600}), Words(0x2301, {5})};
+    for (uint32_t id : {0x2302, 0x2303, 0x2304, 0x2305, 0x2306, 0x2307, 0x2308}) items.push_back(Words(id, {1}));
+    items.insert(items.end(), {Item(0x2403, 0x1005, 1, "\x01"), Item(0x2501, 0x1005, 4, std::string("abc\0", 4)),
+                               Words(0x9999, {1}), Item(0, 0x1003, 1, Be32(7)), Words(0x2101, {0x3102})});
+    const std::string sizes = Words(0x2201, {640, 720}) + Words(0x2202, {1280, 720});
+    const struct {
+        std::string m_bytes;
+        bool m_loaded;
+        const char* m_parts;  // null: every field keeps its default
+    } cases[] = {
+        {"", false, nullptr},
+        {File({Float(0x2001, -0.035f), sizes, ENABLED_SHADER}, 0), false, nullptr},
+        {File(items), true,
+         "enabled=1 mode=0x1002 size=1024x600 distance=-0.035 shift=0.01 angle=-0.05 steps=2 restart=10 "
+         "distance_set=-0.035 shift_set=0.01 angle_set=-0.05 target=800x480 screen=1024x600 axis=0x3002 "
+         "shift_axis=0x3001 ramp_param=0x3003 split=0x3102 order=0x3107 ramp=0x3202 flags=1111110"},
+        {File({sizes, Words(0x2403, {1})}), true, "enabled=1 mode=0x1001 size=640x720"},
+        {File({Float(0x2003, -0.05f), sizes, ENABLED_SHADER, Words(0x2403, {0})}), false,
+         "enabled=0 mode=0x0 size=0x0 angle=-0.05 target=640x720"},
+    };
+    for (const auto& each : cases) {
+        Install(each.m_bytes);
+        testing::internal::CaptureStderr();
+        ovo::StereoProfile profile;
+        const std::string log = testing::internal::GetCapturedStderr();
+        const std::string line = Describe(profile);
+        EXPECT_TRUE(each.m_parts ? Has(line, each.m_parts) : line == Describe(ovo::StereoProfileFields{})) << line;
+        const ovo::StereoMode mode = profile.ResolveMode();
+        profile.m_enabled = profile.m_shader_convert = !profile.m_enabled;
+        EXPECT_EQ(profile.ResolveMode(), mode) << "resolved once, then kept";
+        EXPECT_EQ(profile.LoadProfile(), each.m_loaded) << line;
+        // One line per item read, with the count as the file gives it.
+        EXPECT_EQ(std::count(log.begin(), log.end(), '\n'), each.m_bytes.empty() ? 1 : 25) << log;
+        EXPECT_EQ(log.find("E/ZVT: item.m_data_count = 2\n") != std::string::npos, !each.m_bytes.empty()) << log;
+    }
 }
-
-TEST_F(StereoProfileTest, WithoutAFileEverythingStaysAtItsDefault) {
-    testing::internal::CaptureStderr();
-    ovo::StereoProfile profile;
-    const std::string log = testing::internal::GetCapturedStderr();
-    ExpectDefaults(profile);
-    EXPECT_EQ(profile.m_mode, 0u) << "not resolved during construction";
-    EXPECT_EQ(profile.ResolveMode(), ovo::STEREO_MODE_OFF);
-    EXPECT_EQ(log, "D/ZVT: [Duoscope] LoadPorfile\n");
-    EXPECT_FALSE(profile.LoadProfile());
-}
-
-TEST_F(StereoProfileTest, LoadingLogsOneCountPerItem) {
-    std::string forty_words;
-    for (int index = 0; index < 40; ++index) forty_words += Be32(1);
-    Install(File({Item(0x2501, 0x1005, -5), Item(0x2303, 0x1003, 40, forty_words), Flag(0x2403, true)}));
-    testing::internal::CaptureStderr();
-    ovo::StereoProfile profile;
-    const std::string log = testing::internal::GetCapturedStderr();
-    std::string expected = "D/ZVT: [Duoscope] LoadPorfile\n"
-                           "E/ZVT: item.m_data_count = -5\n"
-                           "E/ZVT: item.m_data_count = 40\n"
-                           "E/ZVT: item.m_data_count = 1\n";
-    for (int index = 3; index < 24; ++index) expected += "E/ZVT: item.m_data_count = 0\n";
-    EXPECT_EQ(log, expected);
-}
-
-TEST_F(StereoProfileTest, ValidityWordZeroChangesNothing) {
-    Install(File({Float(0x2001, -0.035f), Words(0x2101, {0x3102}), Words(0x2201, {800, 480}), ENABLED_SHADER},
-                 0));
-    testing::internal::CaptureStderr();
-    ovo::StereoProfile profile;
-    const std::string log = testing::internal::GetCapturedStderr();
-    ExpectDefaults(profile);
-    EXPECT_EQ(profile.ResolveMode(), ovo::STEREO_MODE_OFF);
-    EXPECT_NE(log.find("E/ZVT: item.m_data_count = 2\n"), std::string::npos) << "the items are still read";
-    EXPECT_FALSE(profile.LoadProfile());
-    EXPECT_EQ(profile.ItemTable().m_items[2].m_id, 0x2201u);
-}
-
-TEST_F(StereoProfileTest, AnAcceptedFileEnablesAndSizesTheProfile) {
-    Install(File({Item(0x2001, 0x1003, 1, "\xBD\x0F\x5C\x29"), Words(0x2201, {640, 720}), Flag(0x2302, false),
-                  Flag(0x2301, false), Flag(0x2403, true)}));
-    ovo::StereoProfile profile;
-    EXPECT_TRUE(profile.m_enabled);
-    EXPECT_EQ(profile.m_eye_distance, -0.035f);
-    EXPECT_EQ(profile.m_eye_distance_set, -0.035f);
-    EXPECT_EQ(profile.m_width, 640);
-    EXPECT_EQ(profile.m_height, 720);
-    EXPECT_EQ(profile.m_mode, ovo::STEREO_MODE_PLAIN) << "resolved by ApplyScreenSize";
-    EXPECT_TRUE(profile.LoadProfile());
-}
-
-TEST_F(StereoProfileTest, TheScreenSizeWinsWhenTheFileAsksForIt) {
-    Install(File({Words(0x2201, {640, 720}), Flag(0x2302, true), Words(0x2202, {1280, 720}), Flag(0x2403, true)}));
-    ovo::StereoProfile profile;
-    EXPECT_EQ(profile.m_width, 1280);
-    EXPECT_EQ(profile.m_height, 720);
-    EXPECT_EQ(profile.m_target_width, 640);
-}
-
-TEST_F(StereoProfileTest, TheLaterOfTwoItemsWins) {
-    Install(File({Words(0x2101, {0x3101}), Words(0x2101, {0x3102}), Flag(0x2403, true)}));
-    ovo::StereoProfile profile;
-    EXPECT_EQ(profile.m_split, ovo::STEREO_SPLIT_TOP_BOTTOM);
-}
-
-TEST_F(StereoProfileTest, AnInvalidProfileKeepsItsValuesButStaysOff) {
-    Install(File({Float(0x2003, -0.05f), Words(0x2201, {800, 480}), Flag(0x2301, true), Flag(0x2403, false)}));
-    ovo::StereoProfile profile;
-    EXPECT_EQ(profile.m_eye_angle, -0.05f);
-    EXPECT_EQ(profile.m_target_width, 800);
-    EXPECT_FALSE(profile.m_enabled);
-    EXPECT_EQ(profile.m_width, 0) << "ApplyScreenSize is not called";
-    EXPECT_EQ(profile.m_mode, 0u);
-    EXPECT_EQ(profile.ResolveMode(), ovo::STEREO_MODE_OFF);
-    EXPECT_FALSE(profile.LoadProfile());
-}
-
-TEST_F(StereoProfileTest, HostileFilesLeaveTheFollowingItemsInPlace) {
-    std::string hundred_words;
-    for (int index = 0; index < 100; ++index) hundred_words += Be32(0xFFFFFFFF);
-    std::string text(300, 'x');
-    Install(File({Item(0x2303, 0x1003, 100, hundred_words), Item(0x2501, 0x1005, 300, text),
-                  Item(0x2001, 0x1004, -7), Item(0x2002, 0x0777, 12), Words(0x2102, {0x3107}), Flag(0x2403, true)}));
-    ovo::StereoProfile profile;
-    EXPECT_TRUE(profile.m_enabled);
-    EXPECT_EQ(profile.m_eye_order, ovo::STEREO_EYE_ORDER_SWAPPED);
-    EXPECT_EQ(profile.ItemTable().m_items[0].m_data_count, 100);
-    EXPECT_EQ(profile.ItemTable().m_items[1].m_data_count, 300);
-}
-
-TEST_F(StereoProfileTest, ATruncatedFileKeepsWhatArrived) {
-    Install((Header() + Flag(0x2403, true) + Words(0x2201, {640, 720})).substr(0, 16 + 12 + 8 + 6));
-    ovo::StereoProfile profile;
-    EXPECT_TRUE(profile.m_enabled);
-    EXPECT_EQ(profile.m_target_width, 640);
-    EXPECT_EQ(profile.m_target_height, 0);
-    EXPECT_EQ(profile.m_width, 640);
-}
-
-TEST_F(StereoProfileTest, TheModeIsResolvedOnceAndKept) {
-    Install(File({ENABLED_SHADER}));
-    ovo::StereoProfile profile;
-    const ovo::StereoMode mode = profile.ResolveMode();
-    EXPECT_EQ(mode, ovo::STEREO_MODE_SHADER) << "this test program is not a listed application";
-    profile.m_enabled = false;
-    profile.m_shader_convert = false;
-    EXPECT_EQ(profile.ResolveMode(), mode);
-    EXPECT_EQ(profile.ApplyScreenSize(), mode);
-}
-
-// ---- The process name ------------------------------------------------------------------
 
 // Run in a process started under the name under test; prints what the profile became.
 TEST(StereoProfileScenario, DISABLED_Print) {
-    testing::internal::CaptureStderr();  // keep the log out of the way
+    testing::internal::CaptureStderr();
     ovo::StereoProfile profile;
     testing::internal::GetCapturedStderr();
     char name[ovo::PROFILE_PROCESS_NAME_CAPACITY];
     ovo::StereoProfile::ReadProcessName(name);
-    std::printf("kind=%d mode=0x%X enabled=%d distance=%.9g angle=%.9g shift=%.9g shift_set=%.9g "
-                "distance_set=%.9g angle_set=%.9g steps=%.9g restart=%.9g size=%dx%d target=%dx%d "
-                "screen=%dx%d axis=0x%X shift_axis=0x%X ramp_param=0x%X split=0x%X order=0x%X ramp=0x%X "
-                "flags=%d%d%d%d%d%d%d name_length=%zu\n",
-                profile.DetectLiveWallpaper(), static_cast<unsigned>(profile.ResolveMode()), profile.m_enabled,
-                static_cast<double>(profile.m_eye_distance), static_cast<double>(profile.m_eye_angle),
-                static_cast<double>(profile.m_eye_shift), static_cast<double>(profile.m_eye_shift_set),
-                static_cast<double>(profile.m_eye_distance_set), static_cast<double>(profile.m_eye_angle_set),
-                static_cast<double>(profile.m_ramp_steps), static_cast<double>(profile.m_ramp_restart),
-                profile.m_width, profile.m_height, profile.m_target_width, profile.m_target_height,
-                profile.m_screen_width, profile.m_screen_height, profile.m_eye_axis, profile.m_shift_axis,
-                profile.m_ramp_param, profile.m_split, profile.m_eye_order, profile.m_ramp,
-                profile.m_shader_convert, profile.m_use_screen_size, profile.m_auto_eye, profile.m_eye_target,
-                profile.m_valid, profile.m_swap_eye_mask, profile.m_force_portrait, std::strlen(name));
+    profile.ResolveMode();
+    std::printf(" %s kind=%d name_length=%zu \n", Describe(profile).c_str(), profile.DetectLiveWallpaper(),
+                std::strlen(name));
 }
 
-// The scenario's line for `process_name`, with the profile file `bytes` (none when empty).
-std::string RunAs(const std::string& process_name, const std::string& bytes) {
-    if (bytes.empty()) {
-        Uninstall();
-    } else {
-        Install(bytes);
-    }
-    ScenarioResult result = RunScenario(process_name.c_str(), "StereoProfileScenario.DISABLED_Print");
-    EXPECT_EQ(result.m_exit_code, 0) << process_name;
-    const size_t start = result.m_output.find("kind=");
-    if (start == std::string::npos) return "<no output> " + result.m_output;
-    return result.m_output.substr(start, result.m_output.find('\n', start) - start);
-}
-
-bool Has(const std::string& line, const std::string& part) { return (" " + line + " ").find(" " + part + " ") != std::string::npos; }
-
-TEST_F(StereoProfileTest, TheBuiltInListIsComparedExactly) {
-    struct Case {
-        const char* m_name;
-        const char* m_mode;
+TEST_F(StereoProfileTest, TheProcessNameDecidesTheModeAndThePreset) {
+    const struct {
+        std::string m_name;
+        std::string m_bytes;
+        const char* m_parts;
     } cases[] = {
-        {"com.Paladog.Lite", "mode=0x1003"},
-        {"com.Paladog", "mode=0x1002"},
-        {"com.paladog.lite", "mode=0x1002"},
-        {"com.Paladog.Lite2", "mode=0x1002"},
-        {"com.rovio.angrybirdsrio.korean", "mode=0x1003"},
-        {"com.rovio.angrybirds", "mode=0x1003"},
-        {"com.rovio.angrybirds_lite", "mode=0x1003"},
-        {"com.rovio.angrybirdsseasons", "mode=0x1003"},
-        {"com.rovio.angrybirdsrio", "mode=0x1003"},
-        {"com.rovio.angrybirdsstarwars.ads.iap", "mode=0x1003"},
-        {"com.rovio.angrybirdsstarwars", "mode=0x1002"},
-        {"com.example.game", "mode=0x1002"},
+        {"com.Paladog.Lite", File({ENABLED_SHADER}), "mode=0x1003"},
+        {"com.android.wallpaper", "", "kind=2 enabled=1 mode=0x1002 distance=-0.005 size=480x800"},
+        // The preset wins over an accepted file but keeps the file's shift_set and ramp_param.
+        {"fishnoodle.snowfall", File({Float(0x2002, 0.02f), Words(0x2006, {0x3003}), Words(0x2101, {0x3102}),
+                                      Words(0x2201, {1024, 600}), ENABLED_SHADER}),
+         "kind=1 distance=-0.035 shift=0 split=0x3101 size=480x800 shift_set=0.02 ramp_param=0x3003"},
+        // Only the first 255 bytes are read, and they are no wallpaper's name.
+        {"com.android.wallpaper" + std::string(400, 'x'), File({ENABLED_SHADER}), "name_length=255 kind=0 mode=0x1002"},
     };
-    const std::string file = File({ENABLED_SHADER});
-    for (const Case& each : cases) {
-        const std::string line = RunAs(each.m_name, file);
-        EXPECT_TRUE(Has(line, each.m_mode)) << each.m_name << ": " << line;
+    for (const auto& each : cases) {
+        Install(each.m_bytes);
+        const ScenarioResult result = RunScenario(each.m_name.c_str(), "StereoProfileScenario.DISABLED_Print");
+        EXPECT_TRUE(Has(result.m_output, each.m_parts)) << each.m_name.substr(0, 40) << ": " << result.m_output;
     }
 }
 
-TEST_F(StereoProfileTest, WithoutShaderConversionTheModeIsPlainWhateverTheName) {
-    const std::string file = File({Flag(0x2301, false), Flag(0x2403, true)});
-    for (const char* name : {"com.Paladog.Lite", "com.example.game"}) {
-        const std::string line = RunAs(name, file);
-        EXPECT_TRUE(Has(line, "mode=0x1001")) << name << ": " << line;
-    }
-}
-
-TEST_F(StereoProfileTest, WithoutAnAcceptedFileTheModeIsOffWhateverTheName) {
-    for (const char* name : {"com.Paladog.Lite", "com.example.game"}) {
-        EXPECT_TRUE(Has(RunAs(name, ""), "mode=0x1000")) << name;
-        EXPECT_TRUE(Has(RunAs(name, File({ENABLED_SHADER}, 0)), "mode=0x1000")) << name;
-    }
-}
-
-TEST_F(StereoProfileTest, TheAndroidWallpaperGetsItsPresetWithoutAFile) {
-    const std::string line = RunAs("com.android.wallpaper", "");
-    for (const char* part : {"kind=2", "mode=0x1002", "enabled=1", "distance=-0.00499999989", "angle=-3",
-                             "size=480x800", "ramp=0x3202", "target=480x800", "screen=480x800", "restart=-1",
-                             "steps=1", "flags=1000101"}) {
-        EXPECT_TRUE(Has(line, part)) << part << " in " << line;
-    }
-}
-
-TEST_F(StereoProfileTest, AWallpaperPresetOverridesAnAcceptedFile) {
-    const std::string file =
-        File({Float(0x2001, 0.5f), Float(0x2002, 0.02f), Float(0x2003, 0.7f), Float(0x2004, 9.0f),
-              Words(0x2005, {0x3003}), Words(0x2006, {0x3003}), Words(0x2101, {0x3102}), Words(0x2102, {0x3107}),
-              Words(0x2111, {0x3201}), Words(0x2201, {1024, 600}), Words(0x2202, {1280, 720}), Flag(0x2301, false),
-              Flag(0x2302, true), Flag(0x2304, true), Flag(0x2308, true), Flag(0x2403, true)});
-    const std::string line = RunAs("fishnoodle.snowfall", file);
-    for (const char* part : {"kind=1", "mode=0x1002", "enabled=1", "distance=-0.0350000001", "angle=-0.0500000007",
-                             "shift=0", "distance_set=-0.0350000001", "angle_set=-0.0500000007", "steps=2",
-                             "restart=5", "size=480x800", "target=480x800", "screen=480x800", "axis=0x3001",
-                             "shift_axis=0x3001", "split=0x3101", "order=0x3106", "ramp=0x3202", "flags=1000101",
-                             // kept from the file
-                             "shift_set=0.0199999996", "ramp_param=0x3003"}) {
-        EXPECT_TRUE(Has(line, part)) << part << " in " << line;
-    }
-}
-
-TEST_F(StereoProfileTest, EveryLiveWallpaperNameIsRecognisedExactly) {
-    struct Case {
-        const char* m_name;
-        int m_kind;
-    } cases[] = {
+TEST(ProcessNamesTest, ListedAndWallpaperNamesAreComparedExactly) {
+    for (const char* name : {"com.rovio.angrybirdsrio.korean", "com.rovio.angrybirds", "com.rovio.angrybirds_lite",
+                             "com.rovio.angrybirdsseasons", "com.Paladog.Lite", "com.rovio.angrybirdsrio",
+                             "com.rovio.angrybirdsstarwars.ads.iap"})
+        EXPECT_TRUE(ovo::IsListedProcess(name)) << name;
+    for (const char* name : {"com.rovio.angrybirdsstarwars", "com.paladog.lite", "com.Paladog", "com.Paladog.Lite2"})
+        EXPECT_FALSE(ovo::IsListedProcess(name)) << name;
+    const std::pair<const char*, int> cases[] = {
         {"fishnoodle.snowfall_free", 1}, {"fishnoodle.snowfall", 1}, {"com.android.wallpaper", 2},
-        {"fishnoodle.koipond_free", 3},  {"fishnoodle.koipond", 3},  {"fishnoodle.aquarium_free", 4},
-        {"fishnoodle.aquarium", 4},      {"fishnoodle.clouds_free", 5}, {"fishnoodle.clouds", 5},
+        {"fishnoodle.koipond_free", 3}, {"fishnoodle.koipond", 3}, {"fishnoodle.aquarium_free", 4},
+        {"fishnoodle.aquarium", 4}, {"fishnoodle.clouds_free", 5}, {"fishnoodle.clouds", 5},
         {"au.com.dealsmap.lwp.cube.PackEarth", 6}, {"com.android.wallpaper.livepicker", 0},
-        {"fishnoodle.snowfal", 0},
-    };
-    for (const Case& each : cases) {
-        const std::string line = RunAs(each.m_name, "");
-        EXPECT_TRUE(Has(line, "kind=" + std::to_string(each.m_kind))) << each.m_name << ": " << line;
-        EXPECT_TRUE(Has(line, each.m_kind != 0 ? "mode=0x1002" : "mode=0x1000")) << each.m_name << ": " << line;
-    }
+        {"fishnoodle.snowfal", 0}, {nullptr, 0}};
+    for (auto [name, kind] : cases) EXPECT_EQ(ovo::LiveWallpaperKindOf(name), kind) << (name ? name : "null");
 }
 
-TEST_F(StereoProfileTest, ALongProcessNameIsCutInsideTheBuffer) {
-    // The name that the buffer keeps is a wallpaper's name only in its first 255 bytes.
-    const std::string line = RunAs("com.android.wallpaper" + std::string(400, 'x'), File({ENABLED_SHADER}));
-    EXPECT_TRUE(Has(line, "name_length=255")) << line;
-    EXPECT_TRUE(Has(line, "kind=0")) << line;
-    EXPECT_TRUE(Has(line, "mode=0x1002")) << line;
-}
-
-// ---- The presets -----------------------------------------------------------------------
-
-TEST(LiveWallpaperPresetTest, EachKindSetsItsValues) {
-    struct Case {
-        int m_kind;
-        float m_distance;
-        float m_angle;
-        float m_steps;
-        float m_restart;
-    } cases[] = {
-        {1, -0.035f, -0.05f, 2.0f, 5.0f},  {2, -0.005f, -3.0f, 1.0f, -1.0f}, {3, -0.001f, -20.0f, 1.0f, -1.0f},
-        {4, -0.03f, -0.01f, 5.0f, 1.0f},   {5, -0.04f, -0.01f, 30.0f, 1.0f}, {6, -0.001f, -20.0f, 1.0f, -1.0f},
-    };
-    for (const Case& each : cases) {
-        SCOPED_TRACE(each.m_kind);
+// Kinds outside 1..6 would index past the preset table.
+TEST(LiveWallpaperTest, EachPresetSetsItsValuesAndOtherKindsNothing) {
+    const char* const distances[] = {"-0.035", "-0.005", "-0.001", "-0.03", "-0.04", "-0.001"};
+    for (int kind = -1; kind <= 7; ++kind) {
+        SCOPED_TRACE(kind);
+        // Start away from the preset, so that every value it sets shows.
         ovo::StereoProfileFields fields;
-        fields.m_eye_shift = 0.3f;
-        fields.m_eye_shift_set = 0.25f;
-        fields.m_ramp_param = ovo::STEREO_AXIS_Y;
-        fields.m_mode = ovo::STEREO_MODE_PLAIN;
+        fields.m_eye_shift = fields.m_eye_shift_set = 0.25f;
+        fields.m_ramp_param = fields.m_shift_axis = fields.m_eye_axis = ovo::STEREO_AXIS_Y;
         fields.m_split = ovo::STEREO_SPLIT_TOP_BOTTOM;
-        fields.m_use_screen_size = true;
-        fields.m_auto_eye = true;
-        fields.m_eye_target = true;
-        fields.m_shift_axis = ovo::STEREO_AXIS_Z;
-        ovo::ApplyLiveWallpaperPreset(fields, each.m_kind);
-        EXPECT_TRUE(fields.m_enabled);
-        EXPECT_EQ(fields.m_mode, ovo::STEREO_MODE_SHADER);
-        EXPECT_EQ(fields.m_width, 480);
-        EXPECT_EQ(fields.m_height, 800);
-        EXPECT_EQ(fields.m_eye_distance, each.m_distance);
-        EXPECT_EQ(fields.m_eye_angle, each.m_angle);
-        EXPECT_EQ(fields.m_ramp_steps, each.m_steps);
-        EXPECT_EQ(fields.m_ramp_restart, each.m_restart);
-        EXPECT_EQ(fields.m_eye_shift, 0.0f);
-        EXPECT_EQ(fields.m_eye_distance_set, each.m_distance);
-        EXPECT_EQ(fields.m_eye_angle_set, each.m_angle);
-        EXPECT_EQ(fields.m_eye_axis, ovo::STEREO_AXIS_X);
-        EXPECT_EQ(fields.m_shift_axis, ovo::STEREO_AXIS_X);
-        EXPECT_EQ(fields.m_split, ovo::STEREO_SPLIT_SIDE_BY_SIDE);
-        EXPECT_EQ(fields.m_eye_order, ovo::STEREO_EYE_ORDER_NORMAL);
-        EXPECT_EQ(fields.m_ramp, ovo::STEREO_RAMP_ON);
-        EXPECT_EQ(fields.m_target_width, 480);
-        EXPECT_EQ(fields.m_target_height, 800);
-        EXPECT_EQ(fields.m_screen_width, 480);
-        EXPECT_EQ(fields.m_screen_height, 800);
-        EXPECT_TRUE(fields.m_shader_convert);
-        EXPECT_FALSE(fields.m_use_screen_size);
-        EXPECT_FALSE(fields.m_auto_eye);
-        EXPECT_FALSE(fields.m_eye_target);
-        EXPECT_TRUE(fields.m_valid);
-        EXPECT_FALSE(fields.m_swap_eye_mask);
-        EXPECT_TRUE(fields.m_force_portrait);
-        EXPECT_EQ(fields.m_eye_shift_set, 0.25f) << "kept";
-        EXPECT_EQ(fields.m_ramp_param, ovo::STEREO_AXIS_Y) << "kept";
-    }
-}
-
-TEST(LiveWallpaperPresetTest, OtherKindsChangeNothing) {
-    for (int kind : {0, 7, -1}) {
-        ovo::StereoProfileFields fields;
+        fields.m_use_screen_size = fields.m_auto_eye = fields.m_eye_target = true;
+        const std::string before = Describe(fields);
         ovo::ApplyLiveWallpaperPreset(fields, kind);
-        EXPECT_FALSE(fields.m_enabled) << kind;
-        EXPECT_EQ(fields.m_mode, 0u) << kind;
+        const std::string line = Describe(fields);
+        if (kind < 1 || kind > 6) {
+            EXPECT_EQ(line, before);
+            continue;
+        }
+        const std::string distance = distances[kind - 1];
+        EXPECT_TRUE(Has(line, "distance=" + distance + " distance_set=" + distance)) << line;
+        EXPECT_TRUE(kind != 1 || Has(line, "angle=-0.05 angle_set=-0.05 steps=2 restart=5")) << line;
+        EXPECT_TRUE(Has(line, "enabled=1 mode=0x1002 size=480x800 shift=0 target=480x800 screen=480x800 axis=0x3001 "
+                              "shift_axis=0x3001 split=0x3101 order=0x3106 ramp=0x3202 flags=1000101 shift_set=0.25 "
+                              "ramp_param=0x3002")) << line;
     }
 }
 
