@@ -1,73 +1,115 @@
 #include <gtest/gtest.h>
 
+#include <cstdarg>
+#include <filesystem>
+#include <fstream>
+#include <memory>
+#include <sstream>
 #include <string>
 
 #include "config/debug_config.h"
-#include "debug_test_files.h"
 
 namespace {
+
+namespace fs = std::filesystem;
 
 const char LOG_PATH[] = "/sdcard/x.log";
 const char FALLBACK_PATH[] = "/data/duoscope/debug.log";
 
-TEST(DebugConfig, KeywordTableHoldsTheConfigurationNames) {
-    RemoveDeviceTrees({"/sdcard"});
-    ovo::DebugConfig config;
-    const char* names[] = {"duoscope", "debug", "output", "version", "enable", "filename"};
-    const int32_t codes[] = {0x1000, 0x1001, 0x1002, 0x3000, 0x3001, 0x3002};
-    ASSERT_EQ(config.m_count, 6);
-    for (int32_t i = 0; i < 6; ++i) {
-        EXPECT_STREQ(config.m_keywords[i].m_name, names[i]);
-        EXPECT_EQ(config.LookUpKeyword(names[i]), codes[i]);
-    }
-    for (const char* unknown : {"Duoscope", "debu", "debugs", "", static_cast<const char*>(nullptr)}) {
-        EXPECT_EQ(config.LookUpKeyword(unknown), 0) << (unknown ? unknown : "null");
-    }
+std::string RootPath(const std::string& device_path) { return OVO_TEST_DEVICE_ROOT + device_path; }
+
+void WriteDeviceFile(const std::string& device_path, const std::string& content) {
+    fs::create_directories(fs::path(RootPath(device_path)).parent_path());
+    std::ofstream(RootPath(device_path), std::ios::binary) << content;
+}
+
+std::string ReadDeviceFile(const std::string& device_path) {
+    std::ifstream in(RootPath(device_path), std::ios::binary);
+    std::ostringstream content;
+    content << in.rdbuf();
+    return in ? content.str() : "<missing>";
+}
+
+// Stale logs that a writer must truncate, and no configuration.
+void ResetDeviceFiles(bool fallback_folder = true) {
+    for (const char* folder : {"/sdcard", "/data/duoscope"}) fs::remove_all(RootPath(folder));
+    WriteDeviceFile(LOG_PATH, "old");
+    if (fallback_folder) WriteDeviceFile(FALLBACK_PATH, "old");
 }
 
 std::string Configuration(const std::string& root_attributes, const std::string& enable,
-                          const std::string& output) {
-    return "<?xml version=\"1.0\"?>\n<!-- debug switch -->\n<duoscope " + root_attributes +
-           ">\n  <debug enable=\"" + enable + "\">\n    " + output + "\n  </debug>\n</duoscope>\n";
+                          const std::string& output = "<output filename=\"/sdcard/x.log\"/>") {
+    return "<?xml version=\"1.0\"?>\n<duoscope " + root_attributes + ">\n  <debug enable=\"" +
+           enable + "\">" + output + "</debug>\n</duoscope>\n";
 }
 
 TEST(DebugConfig, WritesTheLogOnlyWhenSwitchedOn) {
-    const std::string output = "<output filename=\"/sdcard/x.log\"/>";
     const std::string on = "version=\"1.0\"";
     const struct {
-        const char* what;
-        std::string file;  // empty: no configuration file
+        std::string file;      // empty: no configuration file
         const char* log_path;  // where the lines must land; null: nowhere
     } cases[] = {
-        {"working configuration", Configuration(on, "true", output), LOG_PATH},
-        {"version after another attribute", Configuration("a=\"b\" " + on, "true", output), LOG_PATH},
-        {"no filename", Configuration(on, "true", "<output/>"), FALLBACK_PATH},
-        {"unwritable filename", Configuration(on, "true", "<output filename=\"/sdcard/no/x\"/>"),
-         FALLBACK_PATH},
-        {"no configuration file", "", nullptr},
-        {"version 1.1", Configuration("version=\"1.1\"", "true", output), nullptr},
-        {"enable TRUE", Configuration(on, "TRUE", output), nullptr},
-        {"other top-level element",
-         "<config " + on + "><debug enable=\"true\">" + output + "</debug></config>", nullptr},
-        {"duoscope not first", "<other/>" + Configuration(on, "true", output), nullptr},
-        {"unparsable file", "<a/> / " + Configuration(on, "true", output), nullptr},
+        {Configuration(on, "true"), LOG_PATH},
+        {Configuration("a=\"b\" " + on, "true"), LOG_PATH},
+        {Configuration(on, "true", "<output/>"), FALLBACK_PATH},
+        {"", nullptr},
+        {Configuration("version=\"1.1\"", "true"), nullptr},
+        {Configuration(on, "TRUE"), nullptr},
+        {"<other " + on + "/>" + Configuration(on, "true"), nullptr},  // duoscope must come first
+        {"<a/> / " + Configuration(on, "true"), nullptr},
     };
-    const std::string lines =
-        "0007 : eye_distance(1.500000), eye_angle(-0.250000)"
-        "0008 : eye_distance(2.000000), eye_angle(0.500000)";
     for (const auto& test : cases) {
-        SCOPED_TRACE(test.what);
-        RemoveDeviceTrees({"/sdcard", "/data/duoscope"});
-        WriteDeviceFile(FALLBACK_PATH, "old");
-        WriteDeviceFile("/sdcard/duoscope/dconfig.xml", test.file);
-        if (test.file.empty()) RemoveDeviceTrees({"/sdcard/duoscope/dconfig.xml"});
+        SCOPED_TRACE(test.file);
+        ResetDeviceFiles();
+        if (!test.file.empty()) WriteDeviceFile("/sdcard/duoscope/dconfig.xml", test.file);
         {
             ovo::DebugConfig config;
-            config.Print("%04d : eye_distance(%f), eye_angle(%f)", 7, 1.5, -0.25);
-            config.Print("%04d : eye_distance(%f), eye_angle(%f)", 8, 2.0, 0.5);
+            config.Print("%04d : eye_distance(%f)", 7, 1.5);
+            config.Print("|%s", "next");
         }
-        EXPECT_EQ(ReadDeviceFile(LOG_PATH), test.log_path == LOG_PATH ? lines : "<missing>");
+        const std::string lines = "0007 : eye_distance(1.500000)|next";
+        EXPECT_EQ(ReadDeviceFile(LOG_PATH), test.log_path == LOG_PATH ? lines : "old");
         EXPECT_EQ(ReadDeviceFile(FALLBACK_PATH), test.log_path == FALLBACK_PATH ? lines : "old");
+    }
+}
+
+TEST(DebugConfig, LooksUpWholeKeywordsOnly) {
+    ovo::DebugConfig config;
+    EXPECT_EQ(config.LookUpKeyword("filename"), ovo::DEBUG_KEYWORD_FILENAME);
+    const char* const others[] = {"debu", "debugs", "", nullptr};
+    for (const char* other : others) EXPECT_EQ(config.LookUpKeyword(other), 0);
+}
+
+using ovo::DebugLog;
+using VPrint = void (DebugLog::*)(const char*, va_list);
+// Null stands for VPrintTagged.
+const VPrint EVERY_VPRINT[] = {&DebugLog::VPrint0, &DebugLog::VPrint1, &DebugLog::VPrint2,
+                               &DebugLog::VPrint3, nullptr};
+
+void Call(DebugLog& log, VPrint operation, ...) {
+    va_list arguments;
+    va_start(arguments, operation);
+    operation ? (log.*operation)("%d;", arguments) : log.VPrintTagged("[tag] ", "%d;", arguments);
+    va_end(arguments);
+}
+
+TEST(FileDebugLog, WritesToTheFileOrTheFallbackOrNowhere) {
+    const char* missing = "/sdcard/missing/x.log";
+    const std::string text = "5;5;5;5;[tag] 5;%d";
+    const struct {
+        const char* path;
+        bool fallback_folder;
+        std::string log, fallback;  // the files' content afterwards
+    } cases[] = {{LOG_PATH, true, text, "old"}, {missing, true, "old", text},
+                 {missing, false, "old", "<missing>"}};
+    for (const auto& test : cases) {
+        ResetDeviceFiles(test.fallback_folder);
+        std::unique_ptr<DebugLog> log(new ovo::FileDebugLog(test.path));
+        for (VPrint operation : EVERY_VPRINT) Call(*log, operation, 5);
+        log->Write("%d");
+        log.reset();  // closes the file, which flushes it
+        EXPECT_EQ(ReadDeviceFile(LOG_PATH), test.log) << test.path;
+        EXPECT_EQ(ReadDeviceFile(FALLBACK_PATH), test.fallback) << test.path;
     }
 }
 

@@ -1,12 +1,12 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <cstdio>
 #include <memory>
 #include <random>
 #include <string>
 
 #include "config/xml_reader.h"
-#include "debug_test_files.h"
 
 namespace {
 
@@ -14,97 +14,58 @@ using ovo::XmlElement;
 
 const char NO_DOCUMENT[] = "<no document>";
 
-std::unique_ptr<XmlElement> Parse(const std::string& text) {
-    WriteDeviceFile("/tmp/xml/input.xml", text);
-    return std::unique_ptr<XmlElement>(ovo::ParseXmlFile(RootPath("/tmp/xml/input.xml").c_str()));
+std::unique_ptr<XmlElement> Parse(std::string text) {
+    FILE* stream = fmemopen(text.data(), text.size(), "r");
+    std::unique_ptr<XmlElement> document(ovo::ParseXmlStream(stream));
+    std::fclose(stream);
+    return document;
 }
 
-// name[attr=value,...](text){child child}; a document lists its top-level elements.
-std::string Describe(const XmlElement& element) {
-    bool document = element.GetName() == nullptr;
-    std::string out = document ? "" : element.GetName();
-    for (int32_t i = 0; i < element.AttributeCount(); ++i) {
-        out += std::string(i == 0 ? "[" : ",") + element.GetAttribute(i)->GetName() + "=" +
-               element.GetAttribute(i)->GetValue() + (i + 1 == element.AttributeCount() ? "]" : "");
+// name[attr=value]...(text){child}...; a document has no name.
+std::string Describe(const XmlElement* e) {
+    if (e == nullptr) return NO_DOCUMENT;
+    std::string out = e->GetName() != nullptr ? e->GetName() : "";
+    for (int32_t i = 0; i < e->AttributeCount(); ++i) {
+        const ovo::XmlAttribute& a = *e->GetAttribute(i);
+        out += std::string("[") + a.GetName() + "=" + a.GetValue() + "]";
     }
-    if (element.GetValue() != nullptr) out += std::string("(") + element.GetValue() + ")";
-    for (int32_t i = 0; i < element.ChildCount(); ++i) {
-        out += (i > 0 ? " " : document ? "" : "{") + Describe(*element.GetChild(i));
-    }
-    return out + (element.ChildCount() > 0 && !document ? "}" : "");
+    if (e->GetValue() != nullptr) out += std::string("(") + e->GetValue() + ")";
+    for (int32_t i = 0; i < e->ChildCount(); ++i) out += "{" + Describe(e->GetChild(i)) + "}";
+    return out;
 }
 
-std::string Outcome(const std::string& text) {
-    std::unique_ptr<XmlElement> document = Parse(text);
-    return document == nullptr ? NO_DOCUMENT : Describe(*document);
-}
-
-int Depth(const XmlElement& element) {
+int Depth(const XmlElement& e) {
     int deepest = 0;
-    for (int32_t i = 0; i < element.ChildCount(); ++i) {
-        deepest = std::max(deepest, Depth(*element.GetChild(i)));
-    }
+    for (int32_t i = 0; i < e.ChildCount(); ++i) deepest = std::max(deepest, Depth(*e.GetChild(i)));
     return deepest + 1;
 }
 
-struct ReaderCase {
-    const char* what;
-    std::string input;
-    std::string tree;
-};
-
 TEST(XmlReader, BuildsTheTreeThatTheFileDescribes) {
-    const std::string config =
-        "<duoscope version=\"1.0\">\n  <debug enable=\"true\">\n"
-        "    <output filename=\"/sdcard/x.log\"/>\n  </debug>\n</duoscope>\n";
-    const char* config_tree = "duoscope[version=1.0]{debug[enable=true]{output[filename=/sdcard/x.log]}}";
-    const ReaderCase cases[] = {
-        {"plain configuration", config, config_tree},
-        {"declaration and comments are invisible",
-         "<?xml version=\"1.0\"?>\n<!-- switch -->" + config + "<!-- end -->", config_tree},
-        {"<!---> is a whole comment", "<!---><a/>", "a"},
-        {"<!--> is not", "<!--><a/>--><b/>", "b"},
-        {"white space folded", "<a>  one   two  </a>", "a(one two )"},
-        {"attributes in file order", "<a x=\"1\" y=\"2\"/>", "a[x=1,y=2]"},
-        {"string spans lines, keeps entities", "<a x=\"1\n&amp;\"/>", "a[x=1\n&amp;]"},
-        {"later text replaces earlier", "<a>first<b/>>second</a>", "a(second){b}"},
-        {"names after the start tag are ignored", "<a>t<b/> c=d <c/></a>", "a(t){b c}"},
-        {"single quotes delimit nothing", "<a x='1'/><b/>", "b"},
-        {"mismatched close tag drops the element", "<a><b></c></a><d/>", "d"},
-        {"end of file keeps what was read", "<a x=\"1\"><b>text", "a[x=1]{b(text)}"},
-        {"unterminated comment ends the file", "<a/><!-- <b/>", "a"},
-        {"Latin-1 name start bytes", "<\xC0\xD6 \xF6x=\"v\"/>", "\xC0\xD6[\xF6x=v]"},
-        {"other bytes start no name", "<\xD7/><\xF7/><9/><z/>", "z"},
-        {"unterminated string inside an element", "<a x=\"1", ""},
-        {"stray slash between elements", "<a/> / <b/>", NO_DOCUMENT},
-        {"<! without --", "<!DOCTYPE a><a/>", NO_DOCUMENT},
-        {"unterminated string between elements", "<a/>\"<b/>", NO_DOCUMENT},
-        {"token error inside a declaration", "<? / ?><a/>", "a"},
-        {"empty file", "", ""},
+    const std::string fits(1023, 'n'), too_long(1024, 'n');
+    const struct {
+        std::string input, tree;
+    } cases[] = {
+        {"<?xml version=\"1.0\"?><!-- c --><a v=\"1\">\n <b e=\"t\">\n  <c f=\"/x\"/>\n </b>\n</a>",
+         "{a[v=1]{b[e=t]{c[f=/x]}}}"},
+        // "<!--->" is a whole comment, "<!-->" is not; end of file ends one.
+        {"<!---><a/><!--><b/>--><c/><!-- <d/>", "{a}{c}"},
+        {"<a x=\"1\" y=\"2\n&amp;\">  one   two  </a>", "{a[x=1][y=2\n&amp;](one two )}"},
+        // Later text replaces earlier; names after the start tag are no attributes.
+        {"<a>first<b/> c=d <c/>>second</a>", "{a(second){b}{c}}"},
+        {"<a><b></c></a><d/>", "{d}"},
+        {"<a x=\"1\"><b>text", "{a[x=1]{b(text)}}"},
+        {"<\xC0 \xF6=\"v\"/><\xD7/><\xF7/><9/><z/>", "{\xC0[\xF6=v]}{z}"},
+        {"<a x=\"1", ""},
+        {"<a/> / <b/>", NO_DOCUMENT},
+        {"<!DOCTYPE a><a/>", NO_DOCUMENT},
+        {"<? / ?><a/>", "{a}"},  // errors inside a declaration are ignored
+        // The token buffer holds 1023 characters; long text is cut, not fatal.
+        {"<" + fits + " x=\"" + fits + "\"/>", "{" + fits + "[x=" + fits + "]}"},
+        {"<" + too_long + "/><a x=\"" + too_long + "\"/><b/>", "{b}"},
+        {"<a>  " + std::string(3000, 't') + "  <b/></a>", "{a(" + std::string(1023, 't') + "){b}}"},
     };
-    for (const ReaderCase& test : cases) {
-        EXPECT_EQ(Outcome(test.input), test.tree) << test.what;
-    }
-    RemoveDeviceTrees({"/tmp/xml"});
-    EXPECT_EQ(ovo::ParseXmlFile(RootPath("/tmp/xml/input.xml").c_str()), nullptr);
-}
-
-TEST(XmlReader, StaysWithinItsTokenBuffer) {
-    const std::string fits(1023, 'n');
-    const std::string too_long(1024, 'n');
-    const ReaderCase cases[] = {
-        {"name of 1023", "<" + fits + "/>", fits},
-        {"name of 1024", "<" + too_long + "/><b/>", "b"},
-        {"value of 1023", "<a x=\"" + fits + "\"/>", "a[x=" + fits + "]"},
-        {"value of 1024", "<a x=\"" + too_long + "\"/><b/>", "b"},
-        {"value of 1024 between elements", "\"" + too_long + "\"<b/>", NO_DOCUMENT},
-        // Long text is cut, not fatal: the element and what follows it survive.
-        {"text of 3000", "<a>  " + std::string(3000, 't') + "  <b/></a>",
-         "a(" + std::string(1023, 't') + "){b}"},
-    };
-    for (const ReaderCase& test : cases) {
-        EXPECT_EQ(Outcome(test.input), test.tree) << test.what;
-    }
+    for (const auto& c : cases) EXPECT_EQ(Describe(Parse(c.input).get()), c.tree);
+    EXPECT_EQ(ovo::ParseXmlFile("/nonexistent/input.xml"), nullptr);
 }
 
 TEST(XmlReader, SurvivesDeepNestingAndGarbage) {
@@ -117,16 +78,35 @@ TEST(XmlReader, SurvivesDeepNestingAndGarbage) {
     EXPECT_LE(Depth(*document->GetChild(0)), ovo::XML_DEPTH_LIMIT);
 
     std::mt19937 random(20240601);
-    const char steering[] = "<>/?!-=\"abc: \n\xC3\xFF";
+    const std::string tokens = "<>/?!-=\"abc: \n\xC3\xFF";
     for (int round = 0; round < 200; ++round) {
         std::string input(1 + random() % 4096, '\0');
-        for (char& c : input) {
-            c = random() % 2 ? static_cast<char>(random()) : steering[random() % (sizeof(steering) - 1)];
-        }
+        for (char& c : input) c = random() % 2 ? char(random()) : tokens[random() % tokens.size()];
         document = Parse(input);
-        if (document != nullptr) {
-            EXPECT_LE(Depth(*document), ovo::XML_DEPTH_LIMIT + 1);
-        }
+        EXPECT_LE(document == nullptr ? 0 : Depth(*document), ovo::XML_DEPTH_LIMIT + 1);
+    }
+}
+
+TEST(XmlQuery, ResolvesPaths) {
+    const std::string segment63(63, 's'), long_value(300, 'v');
+    std::unique_ptr<XmlElement> document = Parse(
+        "<duoscope><debug enable=\"true\"><output filename=\"/x.log\"/></debug></duoscope>"
+        "<a x=\"outer\"><a x=\"inner\"/><b x=\"first\"/><b x=\"second\"/></a>"
+        "<c:d e:f=\"colon\"/><" + segment63 + " v=\"" + long_value + "\"/>");
+    ASSERT_NE(document, nullptr);
+    const std::pair<std::string, std::string> cases[] = {
+        {"duoscope::debug:$enable", "true"},
+        {"duoscope::missing::output:$filename", ""},
+        {"duoscope::debug:$missing", ""},
+        // Only a name's first element is reachable; a segment naming the current one stays.
+        {"a::b:$x", "first"},
+        {"a::a::a:$x", "outer"},
+        {"c:d:$e:f", "colon"},
+        {segment63 + ":$v", long_value.substr(0, 255)},
+        {segment63 + "s:$v", ""},  // cut to 63 it would name the element above
+    };
+    for (const auto& [path, expected] : cases) {
+        EXPECT_STREQ(document->Query(path.c_str()).m_text, expected.c_str()) << path;
     }
 }
 
