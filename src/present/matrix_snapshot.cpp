@@ -26,9 +26,9 @@ bool MatrixSnapshot::IsOverlayCandidate() const {
     if (!Mat4IsIdentity(m_modelview)) return false;
     GLint source = GL_ONE;
     GLint destination = GL_ZERO;
-    const bool blending = raw::glIsEnabled(GL_BLEND) != GL_FALSE;
     raw::glGetIntegerv(GL_BLEND_SRC, &source);
     raw::glGetIntegerv(GL_BLEND_DST, &destination);
+    const bool blending = raw::glIsEnabled(GL_BLEND) != GL_FALSE;
     return !blending || (source == GL_SRC_ALPHA && destination == GL_ONE_MINUS_SRC_ALPHA);
 }
 

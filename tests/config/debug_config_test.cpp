@@ -4,6 +4,7 @@
 #include <filesystem>
 #include <fstream>
 #include <memory>
+#include <regex>
 #include <sstream>
 #include <string>
 
@@ -100,11 +101,21 @@ TEST(FileDebugLog, WritesToTheFileOrTheFallbackOrNowhere) {
         const char* path;
         bool fallback_folder;
         std::string log, fallback;  // the files' content afterwards
-    } cases[] = {{LOG_PATH, true, text, "old"}, {missing, true, "old", text},
-                 {missing, false, "old", "<missing>"}};
+        std::string opens;  // one per open line: 'o' a stream, '0' none
+    } cases[] = {{LOG_PATH, true, text, "old", "o"}, {missing, true, "old", text, "0o"},
+                 {missing, false, "old", "<missing>", "00"}};
     for (const auto& test : cases) {
         ResetDeviceFiles(test.fallback_folder);
+        testing::internal::CaptureStderr();
         std::unique_ptr<DebugLog> log(new ovo::FileDebugLog(test.path));
+        const std::string lines = std::regex_replace(testing::internal::GetCapturedStderr(),
+                                                     std::regex("stream\\(0x(?!00000000)[0-9a-f]{8}\\)"), "stream(ok)");
+        std::string expected;
+        for (size_t i = 0; i < test.opens.size(); ++i) {
+            expected += std::string("I/ZVT: stream(") + (test.opens[i] == 'o' ? "ok" : "0x00000000") +
+                        ") = fopen(path=" + RootPath(i == 0 ? test.path : FALLBACK_PATH) + ", attrib=wt)\n\n";
+        }
+        EXPECT_EQ(lines, expected);
         for (VPrint operation : EVERY_VPRINT) Call(*log, operation, 5);
         log->Write("%d");
         log.reset();  // closes the file, which flushes it

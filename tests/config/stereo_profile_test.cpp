@@ -270,7 +270,12 @@ TEST(ProcessNamesTest, ListedAndWallpaperNamesAreComparedExactly) {
 
 // Kinds outside 1..6 would index past the preset table.
 TEST(LiveWallpaperTest, EachPresetSetsItsValuesAndOtherKindsNothing) {
-    const char* const distances[] = {"-0.035", "-0.005", "-0.001", "-0.03", "-0.04", "-0.001"};
+    const char* const per_kind[] = {"distance=-0.035 angle=-0.05 steps=2 restart=5",
+                                    "distance=-0.005 angle=-3 steps=1 restart=-1",
+                                    "distance=-0.001 angle=-20 steps=1 restart=-1",
+                                    "distance=-0.03 angle=-0.01 steps=5 restart=1",
+                                    "distance=-0.04 angle=-0.01 steps=30 restart=1",
+                                    "distance=-0.001 angle=-20 steps=1 restart=-1"};
     for (int kind = -1; kind <= 7; ++kind) {
         SCOPED_TRACE(kind);
         // Start away from the preset, so that every value it sets shows.
@@ -286,9 +291,9 @@ TEST(LiveWallpaperTest, EachPresetSetsItsValuesAndOtherKindsNothing) {
             EXPECT_EQ(line, before);
             continue;
         }
-        const std::string distance = distances[kind - 1];
-        EXPECT_TRUE(Has(line, "distance=" + distance + " distance_set=" + distance)) << line;
-        EXPECT_TRUE(kind != 1 || Has(line, "angle=-0.05 angle_set=-0.05 steps=2 restart=5")) << line;
+        EXPECT_TRUE(Has(line, per_kind[kind - 1])) << line;
+        EXPECT_EQ(fields.m_eye_distance_set, fields.m_eye_distance);
+        EXPECT_EQ(fields.m_eye_angle_set, fields.m_eye_angle);
         EXPECT_TRUE(Has(line, "enabled=1 mode=0x1002 size=480x800 shift=0 target=480x800 screen=480x800 axis=0x3001 "
                               "shift_axis=0x3001 split=0x3101 order=0x3106 ramp=0x3202 flags=1000101 shift_set=0.25 "
                               "ramp_param=0x3002")) << line;

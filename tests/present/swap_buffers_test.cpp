@@ -50,9 +50,9 @@ TEST_F(SwapBuffersTest, ThePanelIsReassertedAfterATenthOfASecondOfProcessorTime)
     EXPECT_EQ(PanelRequests(), "") << "the first swap only starts the interval";
     Swap();
     EXPECT_EQ(PanelRequests(), LANDSCAPE);
+    BurnProcessorTime(0.15);
     Swap();
-    Swap();
-    EXPECT_EQ(PanelRequests(), LANDSCAPE) << "the swap after a request starts a new interval";
+    EXPECT_EQ(PanelRequests(), LANDSCAPE) << "the new interval starts at the swap after a request";
     BurnProcessorTime(0.15);
     Swap();
     EXPECT_EQ(PanelRequests(), LANDSCAPE + LANDSCAPE);
@@ -67,9 +67,10 @@ TEST_F(SwapBuffersTest, TheRequestFollowsTheTargetsOrientation) {
     } cases[] = {{800, 480, false, LANDSCAPE},
                  {480, 800, false, PORTRAIT},
                  {600, 600, false, LANDSCAPE},
-                 {800, 480, true, PORTRAIT}};
+                 {800, 480, true, PORTRAIT},
+                 {800, 480, false, ""}};  // no panel node: the file is still read
     for (const Case& each : cases) {
-        device_files::Write("/dev/zpx", "");
+        each.m_request.empty() ? device_files::Remove("/dev/zpx") : device_files::Write("/dev/zpx", "");
         device_files::Write("/sdcard/game_profile.txt", "0.02 1.5");
         Profile().m_target_width = each.m_width;
         Profile().m_target_height = each.m_height;
