@@ -1,6 +1,8 @@
 #include "present/panel_control.h"
 
 #include <gtest/gtest.h>
+#include <sys/ioctl.h>
+#include <unistd.h>
 
 #include "support/device_files.h"
 
@@ -30,6 +32,18 @@ TEST(PanelControlTest, CompositionStartSendsOne) {
     device_files::Write("/dev/zdriver", "");
     ovo::SendCompositionStart();
     EXPECT_EQ(device_files::Read("/dev/zdriver"), "request=0x616 argument=1\n");
+}
+
+// The stand-in answers only for its plain-file nodes; everything else reaches the real ioctl.
+TEST(PanelControlTest, OtherDescriptorsReachTheRealDriver) {
+    int channel[2];
+    ASSERT_EQ(pipe(channel), 0);
+    ASSERT_EQ(write(channel[1], "abc", 3), 3);
+    int pending = 0;
+    EXPECT_EQ(ioctl(channel[0], FIONREAD, &pending), 0);
+    EXPECT_EQ(pending, 3);
+    close(channel[0]);
+    close(channel[1]);
 }
 
 }  // namespace
