@@ -107,6 +107,11 @@ TEST_F(ProfileToolTest, CommentsRawItemsExactFloatsAndTheValidityWord) {
     EXPECT_EQ(zero.rfind("# validity word is 0: nothing in this file applies", 0), 0u) << zero;
     EXPECT_NE(zero.find("\n# valid = true\n# item = 0x2501 0x1005 \"Angry"), std::string::npos) << zero;
     EXPECT_EQ(zero.substr(zero.size() - 12), "\nmode = off\n") << zero;
+
+    // A NaN keeps its exact bits, which a plain "nan" would not.
+    ASSERT_EQ(Write("eye_distance = -nan(0x1)\neye_angle = nan\n", "nan.ovo").first, 0);
+    EXPECT_EQ(Run({"show", In("nan.ovo")}).second, "eye_distance = -nan(0x1)\neye_angle = nan\nmode = off\n");
+    EXPECT_EQ(ReadFile(In("nan.ovo")).substr(24, 4), std::string("\xFF\x80\x00\x01", 4));
 }
 
 TEST_F(ProfileToolTest, BadTextNamesFileAndLineAndWritesNothing) {

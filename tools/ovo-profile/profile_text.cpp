@@ -125,14 +125,28 @@ bool IsWordType(int16_t type) { return type == ovo::PROFILE_TYPE_WORDS || type =
 
 // ---- show -----------------------------------------------------------------------------
 
+constexpr uint32_t FLOAT_SIGN_BIT = 0x80000000u;
+constexpr uint32_t FLOAT_EXPONENT_BITS = 0x7F800000u;
+constexpr uint32_t FLOAT_MANTISSA_BITS = 0x007FFFFFu;
+constexpr uint32_t FLOAT_QUIET_NAN_MANTISSA = 0x00400000u;  // what "nan" reads as
+
 // The shortest "%.Ng" text that reads back as the same float (at most 9 digits, which
-// always suffice for a 32-bit float): -0.035 rather than -0.0350000001.
+// always suffice for a 32-bit float): -0.035 rather than -0.0350000001. A NaN other than
+// the plain one is named by its mantissa bits, "nan(0x1)", since text keeps no payload.
 std::string FormatFloat(float value) {
+    uint32_t bits;
+    std::memcpy(&bits, &value, sizeof(bits));
+    if (std::isnan(value)) {
+        const char* sign = (bits & FLOAT_SIGN_BIT) != 0 ? "-" : "";
+        const uint32_t mantissa = bits & FLOAT_MANTISSA_BITS;
+        if (mantissa == FLOAT_QUIET_NAN_MANTISSA) return Format("%snan", sign);
+        return Format("%snan(0x%" PRIX32 ")", sign, mantissa);
+    }
     std::string text;
     for (int digits = 1; digits <= 9; ++digits) {
         text = Format("%.*g", digits, static_cast<double>(value));
         const float back = std::strtof(text.c_str(), nullptr);
-        if (std::memcmp(&back, &value, sizeof(value)) == 0 || (std::isnan(back) && std::isnan(value))) break;
+        if (std::memcmp(&back, &value, sizeof(value)) == 0) break;
     }
     return text;
 }
@@ -252,9 +266,29 @@ NumberStatus ParseInteger(const std::string& text, int64_t minimum, int64_t maxi
     return NumberStatus::OK;
 }
 
-// A whole 32-bit float as strtof reads it (so "%.9g" output reads back exactly).
+// "nan(0xM)" with an optional sign: the NaN whose mantissa bits are M (1 to 0x7FFFFF).
+NumberStatus ParseNanBits(const std::string& text, float& value) {
+    const bool negative = text[0] == '-';
+    const size_t start = (negative || text[0] == '+') ? 5 : 4;  // after "nan("
+    int64_t mantissa = 0;
+    const NumberStatus status =
+        ParseInteger(text.substr(start, text.size() - start - 1), 1, FLOAT_MANTISSA_BITS, mantissa);
+    if (status != NumberStatus::OK) return status;
+    const uint32_t bits = (negative ? FLOAT_SIGN_BIT : 0) | FLOAT_EXPONENT_BITS | static_cast<uint32_t>(mantissa);
+    std::memcpy(&value, &bits, sizeof(value));
+    return NumberStatus::OK;
+}
+
+bool IsNanWithBits(const std::string& text) {
+    const size_t start = (!text.empty() && (text[0] == '-' || text[0] == '+')) ? 1 : 0;
+    return text.compare(start, 4, "nan(") == 0 && text.back() == ')';
+}
+
+// A whole 32-bit float as strtof reads it (so "%.9g" output reads back exactly), or a NaN
+// by its bits.
 NumberStatus ParseFloat(const std::string& text, float& value) {
     if (text.empty() || std::isspace(static_cast<unsigned char>(text[0]))) return NumberStatus::MALFORMED;
+    if (IsNanWithBits(text)) return ParseNanBits(text, value);
     char* end = nullptr;
     errno = 0;
     const float parsed = std::strtof(text.c_str(), &end);
