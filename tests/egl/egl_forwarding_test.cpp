@@ -3,6 +3,8 @@
 #include <EGL/eglext.h>
 #include <gtest/gtest.h>
 
+#include <utility>
+
 #include "core/entry_tables.h"
 #include "support/forwarding_check.h"
 #include "support/vendor_root.h"
@@ -19,6 +21,31 @@ TEST(EglForwardingTest, EveryEglFunctionReachesTheVendorSlotOfItsIndex) {
 #define OVO_EGL_NULL(index, result, name, params, args)
 #include "core/egl_entry_table.inc"
     EXPECT_EQ(walked, 37u);
+}
+
+template <typename Result, typename... Arguments, size_t... POSITIONS>
+Result CallWithDistinctArguments(Result (*function)(Arguments...), std::index_sequence<POSITIONS...>) {
+    return function(DistinctEglArguments::Make<Arguments>(0, static_cast<uint32_t>(POSITIONS))...);
+}
+
+template <typename Result, typename... Arguments>
+Result CallWithDistinctArguments(Result (*function)(Arguments...)) {
+    return CallWithDistinctArguments(function, std::index_sequence_for<Arguments...>{});
+}
+
+// An application that skips eglGetDisplay finds no vendor behind the EGL functions yet:
+// every forwarder answers 0 (EGL_FALSE, EGL_NO_SURFACE, ...) instead of jumping through null.
+TEST(EglForwardingTest, BeforeTheDriverIsBoundEveryForwarderAnswersZero) {
+    vendor_root::InstallRecorder();
+    uint32_t walked = 0;
+#define OVO_EGL_ENTRY(index, result, name, params, args)                              \
+    EXPECT_EQ(CallWithDistinctArguments(&::name), static_cast<result>(0)) << #name; \
+    ++walked;
+#define OVO_EGL_INTERCEPT(index, result, name, params, args)
+#define OVO_EGL_NULL(index, result, name, params, args)
+#include "core/egl_entry_table.inc"
+    EXPECT_EQ(walked, 31u);
+    EXPECT_EQ(RecorderGetState()->m_call_count, 0u);
 }
 
 TEST(EglForwardingTest, ProcAddressesAreNeverHandedOut) {
