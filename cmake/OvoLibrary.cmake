@@ -7,7 +7,7 @@ set(OVO_ENTRY_MAP "${PROJECT_SOURCE_DIR}/src/entry/exports.map")
 add_library(ovo_core OBJECT)
 target_include_directories(ovo_core PUBLIC "${PROJECT_SOURCE_DIR}/src")
 target_compile_options(ovo_core PRIVATE ${OVO_WARNINGS}
-  -fno-exceptions -fno-rtti -fvisibility=hidden -fvisibility-inlines-hidden)
+  -fno-exceptions -fno-rtti -fvisibility=hidden -fvisibility-inlines-hidden -fno-plt)
 target_link_libraries(ovo_core PUBLIC ${CMAKE_DL_LIBS} Threads::Threads)
 find_package(Threads REQUIRED)
 

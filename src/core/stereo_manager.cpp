@@ -19,6 +19,14 @@ constexpr char NO_PROCESS_NAME[] = "no.proc.name";
 bool IsWhitespace(char byte) { return (byte >= 9 && byte <= 13) || byte == ' '; }
 }  // namespace
 
+std::atomic<StereoManager*> StereoManager::s_instance{nullptr};
+
+StereoManager& StereoManager::Build() {
+    static StereoManager manager;
+    s_instance.store(&manager, std::memory_order_release);
+    return manager;
+}
+
 StereoManager::StereoManager()
     : m_viewport{0, 0, 0, 0},
       m_scissor{0, 0, 0, 0},

@@ -1,6 +1,7 @@
 #ifndef OVO_CORE_STEREO_MANAGER_H
 #define OVO_CORE_STEREO_MANAGER_H
 
+#include <atomic>
 #include <cstddef>
 #include <cstdint>
 
@@ -28,10 +29,11 @@ constexpr size_t PROCESS_NAME_CAPACITY = 1024;
 class StereoManager {
 public:
     // The single manager; the first call in the process builds it (thread-safe), and it
-    // is destroyed at process exit. Inline: every GL call starts here.
+    // is destroyed at process exit. Inline: every GL call starts here, and once the
+    // manager exists that costs one load and a test.
     static StereoManager& instance() {
-        static StereoManager manager;
-        return manager;
+        StereoManager* manager = s_instance.load(std::memory_order_acquire);
+        return __builtin_expect(manager != nullptr, 1) ? *manager : Build();
     }
 
     StereoManager();
@@ -71,6 +73,13 @@ public:
     float m_scale_x;
     float m_scale_y;
     bool m_interleave;
+
+private:
+    // Builds the manager once; concurrent first callers wait for it. Out of line, so that
+    // the GL entry points need no stack frame for it.
+    __attribute__((noinline, cold)) static StereoManager& Build();
+
+    static std::atomic<StereoManager*> s_instance;
 };
 
 // eglGetDisplay's start-up step once the driver is bound: builds the manager if needed
