@@ -74,13 +74,6 @@ TEST(DebugConfig, WritesTheLogOnlyWhenSwitchedOn) {
     }
 }
 
-TEST(DebugConfig, LooksUpWholeKeywordsOnly) {
-    ovo::DebugConfig config;
-    EXPECT_EQ(config.LookUpKeyword("filename"), ovo::DEBUG_KEYWORD_FILENAME);
-    const char* const others[] = {"debu", "debugs", "", nullptr};
-    for (const char* other : others) EXPECT_EQ(config.LookUpKeyword(other), 0);
-}
-
 using ovo::DebugLog;
 using VPrint = void (DebugLog::*)(const char*, va_list);
 // Null stands for VPrintTagged.

@@ -96,13 +96,12 @@ TEST_F(DispatchTest, ControlCodesReadAndSetTheProfileWithoutTheVendor) {
 TEST_F(DispatchTest, ViewportAndScissorAreRecordedAsGiven) {
     ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
     const ovo::StereoManager& manager = ovo::StereoManager::instance();
-    auto fields = [](const ovo::GlRect& rect) {
-        return std::vector<int32_t>{rect.m_x, rect.m_y, rect.m_width, rect.m_height};
-    };
     glViewport(-4, 7, 0, -20);
     glScissor(1, 2, 3, 4);
-    EXPECT_EQ(fields(manager.m_viewport), (std::vector<int32_t>{-4, 7, 0, -20}));
-    EXPECT_EQ(fields(manager.m_scissor), (std::vector<int32_t>{1, 2, 3, 4}));
+    const ovo::GlRect& v = manager.m_viewport;
+    const ovo::GlRect& s = manager.m_scissor;
+    EXPECT_EQ(std::vector<int32_t>({v.m_x, v.m_y, v.m_width, v.m_height, s.m_x, s.m_y, s.m_width, s.m_height}),
+              std::vector<int32_t>({-4, 7, 0, -20, 1, 2, 3, 4}));
 }
 
 TEST_F(DispatchTest, InterleavingKeepsTheStencilMaskFromBeingCleared) {

@@ -45,14 +45,21 @@ protected:
     EglSession m_egl;
 };
 
-TEST_F(EglContextTest, AnEnabledProcessReportsEachNewContext) {
+// The first ES 2.0 context brings in the ES 2.0 layer, once; every context is reported.
+TEST_F(EglContextTest, AnEnabledProcessReportsEachNewContextAndKeepsItsEs2Layer) {
     Profile().m_enabled = true;
+    m_egl.CreateContext(1);
+    EXPECT_FALSE(Manager().m_es2_layer_installed);
     m_egl.CreateContext(2);
+    EXPECT_TRUE(Manager().m_es2_layer_installed);
+    ovo::GlLayer* es2_layer = Manager().m_layer;
     std::string prefix = std::string(ovo::VersionReport::BuildTag()) + "\n[package name]\n\t" +
                          Manager().m_process_name + "\n[gl version]\n\t";
     EXPECT_EQ(ReadReport(), prefix + "OpenGL ES 2.0\n");
+    m_egl.CreateContext(2);
     eglCreateContext(m_egl.m_display, nullptr, EGL_NO_CONTEXT, nullptr);
-    EXPECT_EQ(ReadReport(), prefix + "OpenGL ES 1.x\n") << "the second report replaces the first";
+    EXPECT_EQ(ReadReport(), prefix + "OpenGL ES 1.x\n") << "the last report replaces the others";
+    EXPECT_EQ(Manager().m_layer, es2_layer);
     EXPECT_EQ(std::string(ovo::VersionReport::BuildTag()).rfind("(r ", 0), 0u);
 }
 
@@ -65,18 +72,6 @@ TEST_F(EglContextTest, ADisabledProcessWritesNoReportAndKeepsItsLayer) {
     ResetRecorder();
     glFlush();
     EXPECT_NE(FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glFlush), nullptr);
-}
-
-TEST_F(EglContextTest, TheEs2LayerIsInstalledOnceAndKept) {
-    Profile().m_enabled = true;
-    m_egl.CreateContext(1);
-    EXPECT_FALSE(Manager().m_es2_layer_installed);
-    m_egl.CreateContext(2);
-    EXPECT_TRUE(Manager().m_es2_layer_installed);
-    ovo::GlLayer* es2_layer = Manager().m_layer;
-    m_egl.CreateContext(2);
-    m_egl.CreateContext(1);
-    EXPECT_EQ(Manager().m_layer, es2_layer);
 }
 
 TEST_F(EglContextTest, TheFirstSurfaceFillsMissingSizes) {

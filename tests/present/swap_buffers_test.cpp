@@ -63,36 +63,30 @@ TEST_F(SwapBuffersTest, TheRequestFollowsTheTargetsOrientation) {
         int32_t m_width;
         int32_t m_height;
         bool m_force_portrait;
+        bool m_shader_convert;
+        bool m_node;
         std::string m_request;
-    } cases[] = {{800, 480, false, LANDSCAPE},
-                 {480, 800, false, PORTRAIT},
-                 {600, 600, false, LANDSCAPE},
-                 {800, 480, true, PORTRAIT},
-                 {800, 480, false, ""}};  // no panel node: the file is still read
+        float m_eye_distance;  // 0.02 once the live-tuning file was read
+    } cases[] = {{800, 480, false, true, true, LANDSCAPE, 0.02f},
+                 {480, 800, false, true, true, PORTRAIT, 0.02f},
+                 {600, 600, false, true, true, LANDSCAPE, 0.02f},
+                 {800, 480, true, true, true, PORTRAIT, 7.0f},    // forced portrait reads no file
+                 {800, 480, false, true, false, "", 0.02f},       // no panel node: the file is still read
+                 {800, 480, false, false, true, "", 7.0f}};       // no shader conversion: neither
     for (const Case& each : cases) {
-        each.m_request.empty() ? device_files::Remove("/dev/zpx") : device_files::Write("/dev/zpx", "");
+        each.m_node ? device_files::Write("/dev/zpx", "") : device_files::Remove("/dev/zpx");
         device_files::Write("/sdcard/game_profile.txt", "0.02 1.5");
         Profile().m_target_width = each.m_width;
         Profile().m_target_height = each.m_height;
         Profile().m_force_portrait = each.m_force_portrait;
+        Profile().m_shader_convert = each.m_shader_convert;
         Profile().m_eye_distance = 7.0f;
         Swap();
         BurnProcessorTime(0.15);
         Swap();
         EXPECT_EQ(PanelRequests(), each.m_request) << each.m_width << "x" << each.m_height;
-        // Forced portrait leaves the live-tuning file unread.
-        EXPECT_EQ(Profile().m_eye_distance, each.m_force_portrait ? 7.0f : 0.02f);
+        EXPECT_EQ(Profile().m_eye_distance, each.m_eye_distance) << each.m_width << "x" << each.m_height;
     }
-}
-
-TEST_F(SwapBuffersTest, WithoutShaderConversionThePanelIsLeftAlone) {
-    Profile().m_shader_convert = false;
-    device_files::Write("/sdcard/game_profile.txt", "0.02 1.5");
-    Swap();
-    BurnProcessorTime(0.15);
-    Swap();
-    EXPECT_EQ(PanelRequests(), "");
-    EXPECT_EQ(Profile().m_eye_distance, 0.0f);
 }
 
 TEST_F(SwapBuffersTest, AFailedVendorSwapIsReportedAndTheRefreshStillRuns) {
