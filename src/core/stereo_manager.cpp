@@ -19,11 +19,11 @@ constexpr char NO_PROCESS_NAME[] = "no.proc.name";
 bool IsWhitespace(char byte) { return (byte >= 9 && byte <= 13) || byte == ' '; }
 }  // namespace
 
-std::atomic<StereoManager*> StereoManager::s_instance{nullptr};
+std::atomic<StereoManager*> StereoManager::m_instance{nullptr};
 
 StereoManager& StereoManager::Build() {
     static StereoManager manager;
-    s_instance.store(&manager, std::memory_order_release);
+    m_instance.store(&manager, std::memory_order_release);
     return manager;
 }
 

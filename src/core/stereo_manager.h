@@ -32,7 +32,7 @@ public:
     // is destroyed at process exit. Inline: every GL call starts here, and once the
     // manager exists that costs one load and a test.
     static StereoManager& instance() {
-        StereoManager* manager = s_instance.load(std::memory_order_acquire);
+        StereoManager* manager = m_instance.load(std::memory_order_acquire);
         return __builtin_expect(manager != nullptr, 1) ? *manager : Build();
     }
 
@@ -79,7 +79,7 @@ private:
     // the GL entry points need no stack frame for it.
     __attribute__((noinline, cold)) static StereoManager& Build();
 
-    static std::atomic<StereoManager*> s_instance;
+    static std::atomic<StereoManager*> m_instance;
 };
 
 // eglGetDisplay's start-up step once the driver is bound: builds the manager if needed
