@@ -1,106 +1,62 @@
 #include "common/png_writer.h"
 
+#include <png.h>
+#include <unistd.h>
+
+#include <csetjmp>
 #include <cstdio>
+#include <string>
 
 namespace ovo_sample {
 
 namespace {
 
-constexpr uint8_t PNG_SIGNATURE[8] = {0x89, 'P', 'N', 'G', '\r', '\n', 0x1A, '\n'};
-constexpr uint8_t PNG_BIT_DEPTH = 8;
-constexpr uint8_t PNG_COLOR_RGB = 2;
-constexpr uint8_t PNG_FILTER_NONE = 0;
-constexpr size_t DEFLATE_STORED_MAX = 65535;
-constexpr uint32_t ADLER_MODULUS = 65521;
+// Fixed rather than left to the library's default, so the bytes stay the same across
+// libpng versions that might change it.
+constexpr int PNG_COMPRESSION_LEVEL = 6;
+constexpr size_t PNG_RGBA_BYTES = 4;
 
-uint32_t Crc32(const uint8_t* data, size_t size, uint32_t crc) {
-    crc = ~crc;
-    for (size_t i = 0; i < size; ++i) {
-        crc ^= data[i];
-        for (int32_t bit = 0; bit < 8; ++bit) crc = (crc >> 1) ^ (0xEDB88320u & (0u - (crc & 1u)));
+// libpng reports failures by longjmp, so nothing here may need destroying.
+bool EncodeTo(FILE* file, int32_t width, int32_t height, const uint8_t* rgba) {
+    png_structp png = png_create_write_struct(PNG_LIBPNG_VER_STRING, nullptr, nullptr, nullptr);
+    if (png == nullptr) return false;
+    png_infop info = png_create_info_struct(png);
+    if (info == nullptr) {
+        png_destroy_write_struct(&png, nullptr);
+        return false;
     }
-    return ~crc;
-}
-
-uint32_t Adler32(const std::vector<uint8_t>& data) {
-    uint32_t a = 1;
-    uint32_t b = 0;
-    for (uint8_t byte : data) {
-        a = (a + byte) % ADLER_MODULUS;
-        b = (b + a) % ADLER_MODULUS;
+    if (setjmp(png_jmpbuf(png)) != 0) {
+        png_destroy_write_struct(&png, &info);
+        return false;
     }
-    return (b << 16) | a;
-}
-
-void PutBigEndian32(std::vector<uint8_t>* out, uint32_t value) {
-    out->push_back(static_cast<uint8_t>(value >> 24));
-    out->push_back(static_cast<uint8_t>(value >> 16));
-    out->push_back(static_cast<uint8_t>(value >> 8));
-    out->push_back(static_cast<uint8_t>(value));
-}
-
-void PutChunk(std::vector<uint8_t>* out, const char type[4], const std::vector<uint8_t>& data) {
-    PutBigEndian32(out, static_cast<uint32_t>(data.size()));
-    const size_t type_start = out->size();
-    out->insert(out->end(), type, type + 4);
-    out->insert(out->end(), data.begin(), data.end());
-    // The CRC covers the type and the data, not the length.
-    PutBigEndian32(out, Crc32(out->data() + type_start, 4 + data.size(), 0));
-}
-
-// A zlib stream of stored deflate blocks.
-std::vector<uint8_t> StoreZlib(const std::vector<uint8_t>& raw) {
-    std::vector<uint8_t> out = {0x78, 0x01};
-    size_t offset = 0;
-    do {
-        const size_t size = raw.size() - offset < DEFLATE_STORED_MAX ? raw.size() - offset
-                                                                     : DEFLATE_STORED_MAX;
-        const bool last = offset + size == raw.size();
-        out.push_back(last ? 1 : 0);
-        out.push_back(static_cast<uint8_t>(size));
-        out.push_back(static_cast<uint8_t>(size >> 8));
-        out.push_back(static_cast<uint8_t>(~size));
-        out.push_back(static_cast<uint8_t>(~size >> 8));
-        out.insert(out.end(), raw.begin() + offset, raw.begin() + offset + size);
-        offset += size;
-    } while (offset < raw.size());
-    PutBigEndian32(&out, Adler32(raw));
-    return out;
+    png_init_io(png, file);
+    png_set_IHDR(png, info, static_cast<png_uint_32>(width), static_cast<png_uint_32>(height), 8,
+                 PNG_COLOR_TYPE_RGB, PNG_INTERLACE_NONE, PNG_COMPRESSION_TYPE_DEFAULT,
+                 PNG_FILTER_TYPE_DEFAULT);
+    png_set_compression_level(png, PNG_COMPRESSION_LEVEL);
+    png_write_info(png, info);
+    // The rows hold RGBA; the fourth byte of each pixel is dropped on the way out.
+    png_set_filler(png, 0, PNG_FILLER_AFTER);
+    const size_t row_bytes = static_cast<size_t>(width) * PNG_RGBA_BYTES;
+    for (int32_t row = 0; row < height; ++row) {
+        png_write_row(png, rgba + row_bytes * static_cast<size_t>(row));
+    }
+    png_write_end(png, nullptr);
+    png_destroy_write_struct(&png, &info);
+    return true;
 }
 
 }  // namespace
 
-std::vector<uint8_t> EncodePng(int32_t width, int32_t height, const uint8_t* rgba) {
-    const size_t pixel_count = static_cast<size_t>(width) * static_cast<size_t>(height);
-    std::vector<uint8_t> raw;
-    raw.reserve(pixel_count * 3 + static_cast<size_t>(height));
-    for (size_t i = 0; i < pixel_count; ++i) {
-        if (i % static_cast<size_t>(width) == 0) raw.push_back(PNG_FILTER_NONE);
-        raw.insert(raw.end(), rgba + i * 4, rgba + i * 4 + 3);
-    }
-
-    std::vector<uint8_t> header;
-    PutBigEndian32(&header, static_cast<uint32_t>(width));
-    PutBigEndian32(&header, static_cast<uint32_t>(height));
-    header.push_back(PNG_BIT_DEPTH);
-    header.push_back(PNG_COLOR_RGB);
-    header.push_back(0);  // compression: deflate
-    header.push_back(0);  // filter method: adaptive
-    header.push_back(0);  // no interlace
-
-    std::vector<uint8_t> png(PNG_SIGNATURE, PNG_SIGNATURE + sizeof(PNG_SIGNATURE));
-    PutChunk(&png, "IHDR", header);
-    PutChunk(&png, "IDAT", StoreZlib(raw));
-    PutChunk(&png, "IEND", {});
-    return png;
-}
-
 bool WritePng(const char* path, int32_t width, int32_t height, const uint8_t* rgba) {
-    const std::vector<uint8_t> png = EncodePng(width, height, rgba);
-    FILE* file = std::fopen(path, "wb");
+    const std::string temporary = std::string(path) + "." + std::to_string(getpid()) + ".tmp";
+    FILE* file = std::fopen(temporary.c_str(), "wb");
     if (file == nullptr) return false;
-    const bool written = std::fwrite(png.data(), 1, png.size(), file) == png.size();
-    return std::fclose(file) == 0 && written;
+    const bool encoded = EncodeTo(file, width, height, rgba);
+    const bool closed = std::fclose(file) == 0;
+    if (encoded && closed && std::rename(temporary.c_str(), path) == 0) return true;
+    std::remove(temporary.c_str());
+    return false;
 }
 
 }  // namespace ovo_sample

@@ -2,17 +2,14 @@
 #define OVO_EXAMPLES_COMMON_PNG_WRITER_H
 
 #include <cstdint>
-#include <vector>
 
 namespace ovo_sample {
 
-// An 8-bit RGB PNG of `width` x `height` RGBA pixels, rows top first, in stored
-// (uncompressed) deflate blocks. The same pixels always give the same bytes, so renders
+// Writes `width` x `height` RGBA pixels, rows top first, to `path` as an 8-bit RGB PNG.
+// The same pixels always give the same bytes (fixed compression, no time stamp), so renders
 // compare as files. Alpha is left out: a device's screen never shows the framebuffer's
 // alpha, and where blending left it below 255 image viewers would show see-through spots.
-std::vector<uint8_t> EncodePng(int32_t width, int32_t height, const uint8_t* rgba);
-
-// EncodePng written to `path`; false when the file cannot be written.
+// The file appears complete or not at all; false when it cannot be written.
 bool WritePng(const char* path, int32_t width, int32_t height, const uint8_t* rgba);
 
 }  // namespace ovo_sample
