@@ -98,12 +98,18 @@ void GlStateSnapshot::Save(const GlStateItem* items, size_t count) {
                 raw::glGetIntegerv(GL_CURRENT_PROGRAM, values);
                 break;
         }
-        if (item.m_set) {
-            const GLint* set = item.m_set_value;
-            Apply(SavedState{item.m_kind, item.m_name, {set[0], set[1], set[2], set[3]},
-                             static_cast<GLfloat>(set[1]), nullptr});
-        }
+        if (item.m_set) SetItem(item);
     }
+}
+
+void GlStateSnapshot::Set(const GlStateItem* items, size_t count) {
+    for (size_t i = 0; i < count; ++i) SetItem(items[i]);
+}
+
+void GlStateSnapshot::SetItem(const GlStateItem& item) {
+    const GLint* set = item.m_set_value;
+    Apply(SavedState{item.m_kind, item.m_name, {set[0], set[1], set[2], set[3]},
+                     static_cast<GLfloat>(set[1]), nullptr});
 }
 
 void GlStateSnapshot::Restore(const uint8_t* order, size_t count) const {

@@ -57,6 +57,9 @@ public:
     // Puts items back in the order given: each entry is the position of an item among all
     // items saved so far (0-based, in Save order). Positions past the saved count are ignored.
     void Restore(const uint8_t* order, size_t count) const;
+    // Sets each item to its m_set_value without saving anything: the constant part of what
+    // a drawing operation sets once everything is saved.
+    static void Set(const GlStateItem* items, size_t count);
 
     size_t Count() const { return m_count; }
 
@@ -70,6 +73,7 @@ private:
     };
 
     static void Apply(const SavedState& state);
+    static void SetItem(const GlStateItem& item);
 
     SavedState m_saved[GL_STATE_CAPACITY];
     size_t m_count = 0;

@@ -1,0 +1,66 @@
+#ifndef OVO_PRESENT_COMPOSITION_RENDERER_H
+#define OVO_PRESENT_COMPOSITION_RENDERER_H
+
+#include <cstdint>
+
+#include "config/stereo_profile_fields.h"
+#include "core/gl_api.h"
+
+namespace ovo {
+
+class StereoManager;
+
+// Column interleaving through the stencil buffer: after each swap the stencil becomes 1
+// everywhere and 0 on every second pixel column, and each eye's pass draws where the
+// stencil holds that eye's reference.
+class CompositionRenderer {
+public:
+    // swap_eyes: non-zero exchanges the two eyes' stencil references.
+    CompositionRenderer(GLint color_location, uint32_t swap_eyes);
+    ~CompositionRenderer();
+    CompositionRenderer(const CompositionRenderer&) = delete;
+    CompositionRenderer& operator=(const CompositionRenderer&) = delete;
+
+    // After the vendor swap: clears the new back buffer and draws the column mask. The
+    // first call in the process also starts the panel's composition and builds the lines,
+    // for the drawing path and target size of that moment.
+    void Present(StereoManager& manager);
+    // on == 1 switches the stencil test on, anything else off.
+    void SetMaskTest(int on) const;
+    // Restricts drawing to the columns of `eye`.
+    void SelectEye(int eye) const;
+    // The application's clears keep the mask.
+    static GLbitfield FilterClearMask(GLbitfield mask);
+    // Whether the mask is drawn at the profile's target size; otherwise at 800 x 480.
+    static bool IsKnownTargetSize(const StereoProfileFields& profile);
+
+    int32_t LineCount() const { return m_line_count; }
+    // Line i is entries 4i..4i+3: x0, y0, x1, y1.
+    const float* Vertices() const { return m_vertices; }
+
+private:
+    // Lines for the OpenGL ES 2.0 path, origin at the lower-left corner.
+    void BuildLinesGl2(const StereoProfileFields& profile);
+    // Lines for the OpenGL ES 1.x path, origin at the centre.
+    void BuildLinesGl1(const StereoProfileFields& profile);
+    // Allocates room for the lines; false (and no lines) when memory is short.
+    bool AllocateLines(const StereoProfileFields& profile);
+    void DrawMask(const StereoManager& manager);
+    void DrawLinesGl2(GLsizei width, GLsizei height);
+    void DrawLinesGl1(GLsizei width, GLsizei height) const;
+    void BuildProgram();
+
+    int32_t m_line_count;
+    float* m_vertices;
+    float m_projection[16];
+    GLint m_matrix_location;
+    GLint m_color_location;
+    uint32_t m_swap_eyes;
+    GLuint m_program;
+    GLuint m_vertex_shader;
+    GLuint m_fragment_shader;
+};
+
+}  // namespace ovo
+
+#endif
