@@ -1,0 +1,32 @@
+#ifndef OVO_TOOLS_OVO_FRAMES_COLUMN_OPS_H
+#define OVO_TOOLS_OVO_FRAMES_COLUMN_OPS_H
+
+#include "rgba_frame.h"
+
+// The panel shows the two eye images interleaved by pixel column: one eye on the even
+// columns (0, 2, 4, ...), the other on the odd ones.
+namespace ovo_frames {
+
+enum ColumnParity : int32_t {
+    COLUMN_PARITY_EVEN = 0,
+    COLUMN_PARITY_ODD = 1,
+};
+
+// The frame the panel receives: eye 0's pixels on the columns of `eye0_columns`, eye 1's on
+// the others. Both eyes have the same size.
+RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity eye0_columns);
+
+// The two eyes of an interleaved frame `raw` (even width) next to each other, eye 0 on the
+// left, each at full width: an eye's column fills itself and its neighbour of the other
+// eye. 2W x H, so the preview keeps the aspect.
+RgbaFrame Preview(const RgbaFrame& raw, ColumnParity eye0_columns);
+
+// Red-cyan anaglyph of an interleaved frame `raw` (even width), each eye at full width as
+// in Preview: red from eye 0 (left), green and blue from eye 1 (right). Each eye is turned
+// to grey (its luma) first: in colour, an object that is red or cyan reaches one eye only
+// and the two eyes' images fight.
+RgbaFrame Anaglyph(const RgbaFrame& raw, ColumnParity eye0_columns);
+
+}  // namespace ovo_frames
+
+#endif
