@@ -1,28 +1,33 @@
 #include "common/sample_runner.h"
 
 #include <cstdio>
+#include <ctime>
 #include <vector>
 
 #include "common/frame_capture.h"
 #include "common/pbuffer_context.h"
 #include "common/png_writer.h"
-#include "common/sample_args.h"
 
 namespace ovo_sample {
 
 namespace {
 
-constexpr int EXIT_FAILED = 1;
-constexpr int EXIT_USAGE = 2;
+bool EnoughProcessorTime(double seconds) {
+    return static_cast<double>(std::clock()) >= seconds * CLOCKS_PER_SEC;
+}
 
-// Draws every frame with a swap after each. The last frame is read before its swap, as a
-// game's screenshot is: after a swap a window's back buffer holds nothing defined.
-bool DrawFrames(const char* program, SampleScene* scene, PbufferContext* context,
-                int32_t frames, std::vector<uint8_t>* last_frame) {
-    for (int32_t frame = 0; frame < frames; ++frame) {
+// Draws frames with a swap after each, at least `args.m_frames` and until the processor
+// time asked for is used. The last frame is read before its swap, as a game's screenshot
+// is: after a swap a window's back buffer holds nothing defined.
+bool DrawFrames(const char* program, const SampleArgs& args, SampleScene* scene,
+                PbufferContext* context, std::vector<uint8_t>* last_frame) {
+    const PixelSize size = args.m_size;
+    for (int32_t frame = 0;; ++frame) {
         scene->DrawFrame(frame);
-        if (frame == frames - 1) *last_frame = ReadFrame(SAMPLE_WIDTH, SAMPLE_HEIGHT);
+        const bool last = frame + 1 >= args.m_frames && EnoughProcessorTime(args.m_cpu_seconds);
+        if (last) *last_frame = ReadFrame(size.m_width, size.m_height);
         if (!context->SwapBuffers()) return false;
+        if (last) break;
     }
     const uint32_t error = TakeGlError();
     if (error != 0) {
@@ -36,27 +41,31 @@ bool DrawFrames(const char* program, SampleScene* scene, PbufferContext* context
 
 int RunSample(const SampleInfo& info, SampleScene* scene, int argc, char** argv) {
     SampleArgs args;
-    if (!ParseSampleArgs(info.m_program, argc, argv, &args)) return EXIT_USAGE;
+    if (!ParseSampleArgs(info, argc, argv, &args)) return SAMPLE_EXIT_USAGE;
+    return RunSample(info, args, scene);
+}
 
+int RunSample(const SampleInfo& info, const SampleArgs& args, SampleScene* scene) {
+    const PixelSize size = args.m_size;
     PbufferContext context;
-    if (!context.Create(info.m_program, info.m_client_version, SAMPLE_WIDTH, SAMPLE_HEIGHT)) {
+    if (!context.Create(info.m_program, info.m_client_version, size.m_width, size.m_height)) {
         context.Destroy();
-        return EXIT_FAILED;
+        return SAMPLE_EXIT_FAILED;
     }
-    if (!scene->Init(info.m_program, SAMPLE_WIDTH, SAMPLE_HEIGHT)) {
+    if (!scene->Init(info.m_program, args.m_game_size.m_width, args.m_game_size.m_height)) {
         scene->Release();
         context.Destroy();
-        return EXIT_FAILED;
+        return SAMPLE_EXIT_FAILED;
     }
     std::vector<uint8_t> pixels;
-    bool ok = DrawFrames(info.m_program, scene, &context, args.m_frames, &pixels);
+    bool ok = DrawFrames(info.m_program, args, scene, &context, &pixels);
     scene->Release();
     ok = context.Destroy() && ok;
-    if (!ok) return EXIT_FAILED;
+    if (!ok) return SAMPLE_EXIT_FAILED;
 
-    if (!WritePng(args.m_output, SAMPLE_WIDTH, SAMPLE_HEIGHT, pixels.data())) {
+    if (!WritePng(args.m_output, size.m_width, size.m_height, pixels.data())) {
         std::fprintf(stderr, "%s: cannot write %s\n", info.m_program, args.m_output);
-        return EXIT_FAILED;
+        return SAMPLE_EXIT_FAILED;
     }
     std::printf("%s: wrote %s\n", info.m_program, args.m_output);
     return 0;

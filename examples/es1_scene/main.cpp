@@ -1,6 +1,6 @@
 // es1_scene: an OpenGL ES 1.1 fixed-function 3D scene with a 2D HUD, rendered off-screen
 // and written as a PNG.
-//   es1_scene OUTPUT.png [--frames N]
+//   es1_scene OUTPUT.png [--frames N] [--size WxH] [--game-size WxH] [--cpu-seconds S]
 #include "common/sample_runner.h"
 #include "es1_scene/es1_scene.h"
 
