@@ -9,7 +9,13 @@
 #include "config/debug_config.h"
 #include "core/gl_layer.h"
 #include "platform/device_path.h"
+#include "present/composition_renderer.h"
 #include "present/viewer_tracker.h"
+#include "stereo/es1_scaled_layer.h"
+#include "stereo/es1_sprite_stereo_layer.h"
+#include "stereo/es1_stereo_layer.h"
+#include "stereo/gl_object_tracker.h"
+#include "stereo/overlay_target.h"
 
 namespace ovo {
 
@@ -42,7 +48,11 @@ StereoManager::StereoManager()
       m_debug(nullptr),
       m_profile(nullptr),
       m_layer(nullptr),
+      m_overlay(nullptr),
       m_viewer(nullptr),
+      m_objects(nullptr),
+      m_eye_textures(nullptr),
+      m_composer(nullptr),
       m_frame_number(0),
       m_es2_layer_installed(false),
       m_scale_x(1.0f),
@@ -50,35 +60,56 @@ StereoManager::StereoManager()
       m_interleave(false) {
     ReadProcessName(m_process_name);
     m_profile = new StereoProfile();
+    m_overlay = new OverlayTarget(m_profile->m_target_width, m_profile->m_target_height,
+                                  OVERLAY_CREATE_OBJECTS);
     m_debug = new DebugConfig();
     m_viewer = new ViewerTracker(m_profile->m_auto_eye);
-    m_layer = CreateLayerForMode(m_profile->ResolveMode());
+    const StereoMode mode = m_profile->ResolveMode();
+    m_layer = CreateLayerForMode(mode);
+    m_objects = new GlObjectTracker();
+    const bool shader_mode = mode == STEREO_MODE_SHADER || mode == STEREO_MODE_SHADER_LISTED;
+    if (shader_mode && m_profile->m_valid) {
+        m_composer = new CompositionRenderer(0, m_profile->m_swap_eye_mask ? 1 : 0);
+        m_interleave = true;
+    }
     UpdateScale();
 }
 
 StereoManager::~StereoManager() {
+    delete m_objects;
     delete m_layer;
     delete m_viewer;
     delete m_debug;
+    delete m_overlay;
     delete m_profile;
+    // Released last: nothing that goes before draws any more.
+    delete m_composer;
+    m_objects = nullptr;
     m_layer = nullptr;
     m_viewer = nullptr;
     m_debug = nullptr;
+    m_overlay = nullptr;
     m_profile = nullptr;
+    m_composer = nullptr;
     m_interleave = false;
     m_es2_layer_installed = false;
 }
 
 GlLayer* StereoManager::CreateLayerForMode(StereoMode mode) {
-    // Every mode draws flat until the stereo layers exist.
-    (void)mode;
-    return new PassThroughLayer();
+    switch (mode) {
+        case STEREO_MODE_PLAIN: return new Es1ScaledLayer();
+        case STEREO_MODE_SHADER: return new Es1StereoLayer();
+        case STEREO_MODE_SHADER_LISTED: return new Es1SpriteStereoLayer();
+        default: return new PassThroughLayer();
+    }
 }
 
 void StereoManager::InstallEs2Layer() {
     if (m_es2_layer_installed) return;
     m_es2_layer_installed = true;
     delete m_layer;
+    // The OpenGL ES 2.0 stereo layers come with the shader rewriter; until then such a
+    // process draws flat.
     m_layer = new PassThroughLayer();
 }
 

@@ -10,9 +10,13 @@
 
 namespace ovo {
 
+class CompositionRenderer;
 class DebugConfig;
 class GlLayer;
+class GlObjectTracker;
+class OverlayTarget;
 class ViewerTracker;
+struct EyeTexturePair;
 
 // A rectangle as glViewport and glScissor take it.
 struct GlRect {
@@ -67,7 +71,11 @@ public:
     DebugConfig* m_debug;
     StereoProfile* m_profile;
     GlLayer* m_layer;
+    OverlayTarget* m_overlay;
     ViewerTracker* m_viewer;
+    GlObjectTracker* m_objects;
+    EyeTexturePair* m_eye_textures;
+    CompositionRenderer* m_composer;
     uint32_t m_frame_number;
     bool m_es2_layer_installed;
     float m_scale_x;

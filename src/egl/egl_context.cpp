@@ -6,6 +6,7 @@
 #include "core/raw_egl.h"
 #include "core/stereo_manager.h"
 #include "entry/export.h"
+#include "stereo/overlay_target.h"
 
 namespace ovo {
 namespace {
@@ -68,8 +69,10 @@ OVO_EXPORT EGLContext EGLAPIENTRY eglCreateContext(EGLDisplay dpy, EGLConfig con
                                                    EGLContext share_context,
                                                    const EGLint* attrib_list) {
     EGLContext context = ovo::vendor_egl::eglCreateContext(dpy, config, share_context, attrib_list);
-    if (context == EGL_NO_CONTEXT) return context;
     ovo::StereoManager& manager = ovo::StereoManager::instance();
+    // The overlay's objects are made again in whatever context is made current next.
+    if (manager.m_profile->m_eye_target) manager.m_overlay->Reset();
+    if (context == EGL_NO_CONTEXT) return context;
     uint32_t index = ovo::ClientApiIndex(manager, attrib_list);
     ovo::g_vendor_driver.m_client_api_index = index;
     if (manager.m_profile->m_enabled) ovo::WriteVersionReport(manager, index);
@@ -78,11 +81,17 @@ OVO_EXPORT EGLContext EGLAPIENTRY eglCreateContext(EGLDisplay dpy, EGLConfig con
 
 OVO_EXPORT EGLBoolean EGLAPIENTRY eglMakeCurrent(EGLDisplay dpy, EGLSurface draw, EGLSurface read,
                                                  EGLContext ctx) {
+    ovo::StereoManager& manager = ovo::StereoManager::instance();
+    const bool has_context = ctx != EGL_NO_CONTEXT;
+    const bool eye_target = manager.m_profile->m_eye_target;
+    // The overlay's objects go while the old context is still current.
+    if (!has_context && eye_target) manager.m_overlay->Release();
     EGLBoolean result = ovo::vendor_egl::eglMakeCurrent(dpy, draw, read, ctx);
-    bool has_context = ctx != EGL_NO_CONTEXT;
     if (result == EGL_TRUE) ovo::SelectThreadHooks(has_context);
-    // Sizes are captured even when the vendor refused, as long as a context was named.
-    if (has_context) ovo::CaptureSurfaceSize(ovo::StereoManager::instance(), dpy, draw);
+    // The rest runs even when the vendor refused, as long as a context was named.
+    if (!has_context) return result;
+    if (eye_target) manager.m_overlay->Create();
+    ovo::CaptureSurfaceSize(manager, dpy, draw);
     return result;
 }
 

@@ -3,6 +3,8 @@
 
 #include "core/gl_layer.h"
 #include "core/stereo_manager.h"
+#include "present/composition_renderer.h"
+#include "stereo/overlay_target.h"
 
 namespace ovo {
 
@@ -54,8 +56,16 @@ template <>
 struct GlEntryPoint<GL_ENTRY_glClear> {
     static void Call(StereoManager& manager, GLbitfield mask) {
         // The column-interleave mask lives in the stencil buffer; the game must not wipe it.
-        if (manager.m_interleave) mask &= ~static_cast<GLbitfield>(GL_STENCIL_BUFFER_BIT);
+        if (manager.m_interleave) mask = CompositionRenderer::FilterClearMask(mask);
         manager.m_layer->glClear(manager, mask);
+    }
+};
+
+template <>
+struct GlEntryPoint<GL_ENTRY_glBindFramebuffer> {
+    static void Call(StereoManager& manager, GLenum target, GLuint framebuffer) {
+        manager.m_overlay->SetBoundFramebuffer(framebuffer);
+        manager.m_layer->glBindFramebuffer(manager, target, framebuffer);
     }
 };
 

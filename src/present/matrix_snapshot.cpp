@@ -22,8 +22,8 @@ void MatrixSnapshot::Capture() {
     raw::glGetIntegerv(GL_MATRIX_MODE, &m_matrix_mode);
 }
 
-bool MatrixSnapshot::IsOverlayCandidate() const {
-    if (!Mat4IsIdentity(m_modelview)) return false;
+bool IsOverlayCandidate(const float modelview[16]) {
+    if (!Mat4IsIdentity(modelview)) return false;
     GLint source = GL_ONE;
     GLint destination = GL_ZERO;
     raw::glGetIntegerv(GL_BLEND_SRC, &source);
@@ -44,12 +44,12 @@ void MatrixSnapshot::LoadEyeProjection(const float t1[3], const float t2[3]) con
     raw::glTranslatef(t1[0], t1[1], t1[2]);
 }
 
-void MatrixSnapshot::Restore() const {
+void RestoreMatrices(const float projection[16], const float modelview[16], int32_t matrix_mode) {
     raw::glMatrixMode(GL_PROJECTION);
-    raw::glLoadMatrixf(m_projection);
+    raw::glLoadMatrixf(projection);
     raw::glMatrixMode(GL_MODELVIEW);
-    raw::glLoadMatrixf(m_modelview);
-    raw::glMatrixMode(static_cast<GLenum>(m_matrix_mode));
+    raw::glLoadMatrixf(modelview);
+    raw::glMatrixMode(static_cast<GLenum>(matrix_mode));
 }
 
 }  // namespace ovo
