@@ -1,0 +1,134 @@
+// The ramp, the sprite depth planes and the frame boundary.
+#include "present/matrix4.h"
+#include "present/viewer_tracker.h"
+#include "stereo/frame_parameters.h"
+#include "stereo_fixture.h"
+
+namespace {
+
+class FrameParametersTest : public StereoFixture {
+protected:
+    static void BindTexture(GLint texture) {
+        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {texture});
+    }
+
+    static void StartFrame() {
+        Manager().m_frame_draws = 0;
+        Manager().m_last_texture = 0;
+        Manager().m_depth_plane = -Manager().m_depth_start;
+    }
+};
+
+TEST_F(FrameParametersTest, TheRampStepsTowardZeroThenKeepsTheRestartValue) {
+    struct Case {
+        float m_configured;
+        std::vector<float> m_seen;  // by the draws of textures 1 to 6
+    } cases[] = {
+        {-0.04f, {-0.04f, -0.03f, -0.02f, -0.01f, 0.004f, 0.004f}},
+        {0.04f, {0.04f, 0.03f, 0.02f, 0.01f, -0.004f, -0.004f}},
+        {0.0f, {0.0f, 0.0f, 0.0f, 0.0f, 0.0f, 0.0f}},
+    };
+    Profile().m_ramp_steps = 4.0f;
+    Profile().m_ramp_restart = 10.0f;
+    Profile().m_ramp_param = ovo::STEREO_AXIS_X;
+    for (const Case& each : cases) {
+        Profile().m_eye_distance_set = each.m_configured;
+        Profile().m_eye_distance = 123.0f;  // the first step of a frame restores the configured value
+        StartFrame();
+        for (size_t texture = 1; texture <= each.m_seen.size(); ++texture) {
+            BindTexture(static_cast<GLint>(texture));
+            ovo::StepRampEs1(Manager());
+            EXPECT_NEAR(Profile().m_eye_distance, each.m_seen[texture - 1], 1e-7)
+                << "configured " << each.m_configured << ", texture " << texture;
+            // The same texture again moves nothing.
+            ovo::StepRampEs1(Manager());
+            EXPECT_NEAR(Profile().m_eye_distance, each.m_seen[texture - 1], 1e-7);
+        }
+    }
+}
+
+TEST_F(FrameParametersTest, EachFormRampsItsOwnParameter) {
+    struct Case {
+        void (*m_step)(ovo::StereoManager&);
+        uint32_t m_param;
+        int m_ramped;  // 0 distance, 1 angle, 2 shift
+        bool m_shift_restored;
+    } cases[] = {
+        {ovo::StepRampEs1, ovo::STEREO_AXIS_X, 0, true},  {ovo::StepRampEs1, ovo::STEREO_AXIS_Y, 1, true},
+        {ovo::StepRampEs1, ovo::STEREO_AXIS_Z, 2, true},  {ovo::StepRampEs1, 0x3999, 0, true},
+        {ovo::StepRampEs2, ovo::STEREO_AXIS_Y, 1, false}, {ovo::StepRampEs2, ovo::STEREO_AXIS_Z, 0, false},
+    };
+    Profile().m_ramp_steps = 2.0f;
+    for (const Case& each : cases) {
+        Profile().m_ramp_param = each.m_param;
+        Profile().m_eye_distance_set = 0.4f;
+        Profile().m_eye_angle_set = 0.4f;
+        Profile().m_eye_shift_set = 0.4f;
+        Profile().m_eye_shift = 9.0f;
+        StartFrame();
+        BindTexture(1);
+        each.m_step(Manager());
+        BindTexture(2);
+        each.m_step(Manager());
+        const float values[3] = {Profile().m_eye_distance, Profile().m_eye_angle, Profile().m_eye_shift};
+        for (int parameter = 0; parameter < 3; ++parameter) {
+            float expected = parameter == each.m_ramped ? 0.2f : 0.4f;
+            if (parameter == 2 && !each.m_shift_restored) expected = 9.0f;
+            EXPECT_FLOAT_EQ(values[parameter], expected) << std::hex << each.m_param << " " << parameter;
+        }
+    }
+}
+
+TEST_F(FrameParametersTest, ASteplessRampTakesOneStep) {
+    Profile().m_ramp_steps = 0.0f;
+    Profile().m_eye_distance_set = 0.5f;
+    StartFrame();
+    BindTexture(1);
+    ovo::StepRampEs1(Manager());
+    BindTexture(2);
+    ovo::StepRampEs1(Manager());
+    EXPECT_EQ(Profile().m_ramp_steps, 1.0f);
+    EXPECT_FLOAT_EQ(Profile().m_eye_distance, -0.05f) << "reached zero at once: restarted";
+}
+
+TEST_F(FrameParametersTest, SpriteDepthPlanesCycleWithTextureChanges) {
+    const GLint textures[] = {4, 4, 7, 9, 2, 5, 5};
+    const float planes[] = {-5.0f, -5.0f, -3.0f, -1.0f, -5.0f, -3.0f, -3.0f};
+    StartFrame();
+    for (size_t draw = 0; draw < sizeof(textures) / sizeof(textures[0]); ++draw) {
+        BindTexture(textures[draw]);
+        ovo::StepDepthPlane(Manager());
+        EXPECT_EQ(Manager().m_depth_plane, planes[draw]) << "draw " << draw;
+        EXPECT_EQ(Manager().m_frame_draws, draw + 1);
+    }
+}
+
+TEST_F(FrameParametersTest, TheFrameBoundaryTakesTheViewersEstimateAndRestartsThePlanes) {
+    delete Manager().m_viewer;
+    Manager().m_viewer = new ovo::ViewerTracker(true);
+    // An off-centre frustum, so that the nearest object lies off the eye axis.
+    float projection[16];
+    ovo::Mat4Frustum(projection, -1.0f, 3.0f, -1.0f, 1.0f, 1.0f, 10.0f);
+    float modelview[16];
+    ovo::Mat4Identity(modelview);
+    modelview[14] = -4.0f;
+    Manager().m_viewer->Observe(projection, modelview);
+    ovo::ViewerTracker reference(true);
+    reference.Observe(projection, modelview);
+    reference.EstimateEyes();
+
+    Manager().m_depth_plane = 3.0f;
+    Manager().m_frame_draws = 17;
+    Manager().m_last_texture = 9;
+    const uint32_t frame = Manager().m_frame_number;
+    ovo::BeginFrame(Manager());
+    EXPECT_NE(reference.EyeDistance(), 0.0f);
+    EXPECT_EQ(Profile().m_eye_distance, reference.EyeDistance());
+    EXPECT_EQ(Profile().m_eye_angle, reference.EyeAngle());
+    EXPECT_EQ(Manager().m_depth_plane, -5.0f);
+    EXPECT_EQ(Manager().m_frame_draws, 0u);
+    EXPECT_EQ(Manager().m_last_texture, 0u);
+    EXPECT_EQ(Manager().m_frame_number, frame + 1);
+}
+
+}  // namespace

@@ -1,0 +1,83 @@
+#ifndef OVO_TESTS_STEREO_STEREO_FIXTURE_H
+#define OVO_TESTS_STEREO_STEREO_FIXTURE_H
+
+#include <gtest/gtest.h>
+
+#include <string>
+#include <vector>
+
+#include "core/entry_tables.h"
+#include "core/stereo_manager.h"
+#include "present/composition_renderer.h"
+#include "support/egl_session.h"
+#include "support/forwarding_check.h"
+#include "support/recorded_calls.h"
+#include "support/vendor_root.h"
+
+// An OpenGL ES 1.x context on the recording vendor and a manager whose profile the test
+// sets field by field; the layers under test are built directly.
+class StereoFixture : public ::testing::Test {
+protected:
+    void SetUp() override {
+        vendor_root::InstallRecorder();
+        m_egl.Open();
+        ASSERT_NE(m_egl.m_display, EGL_NO_DISPLAY);
+        ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(1)), EGL_TRUE);
+        ovo::StereoProfile& profile = Profile();
+        profile.m_width = 800;
+        profile.m_height = 480;
+        profile.m_target_width = 800;
+        profile.m_target_height = 480;
+        profile.m_eye_distance = 0.5f;
+        profile.m_eye_angle = 0.25f;
+        profile.m_eye_shift = 0.125f;
+        Manager().m_viewport = {0, 0, 800, 480};
+        Manager().m_scissor = {0, 0, 800, 480};
+        recorded_calls::ClearAnswers();
+        AnswerMatrix(GL_MODELVIEW_MATRIX, IDENTITY);
+        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_MATRIX_MODE, {GL_MODELVIEW});
+        ResetRecorder();
+    }
+
+    static ovo::StereoManager& Manager() { return ovo::StereoManager::instance(); }
+    static ovo::StereoProfile& Profile() { return *Manager().m_profile; }
+
+    // Interleaving on (with the default eye swap) or off.
+    static void Interleave(bool on) {
+        if (on && Manager().m_composer == nullptr) Manager().m_composer = new ovo::CompositionRenderer(0, 1);
+        Manager().m_interleave = on;
+    }
+
+    static void AnswerMatrix(GLenum which, const std::vector<GLfloat>& matrix) {
+        recorded_calls::AnswerBytes(ovo::GL_ENTRY_glGetFloatv, which, matrix.data(),
+                                    matrix.size() * sizeof(GLfloat));
+    }
+
+    // The recorded calls to the named functions only, in order.
+    static std::vector<std::string> Only(const std::vector<std::string>& names) {
+        std::vector<std::string> kept;
+        for (const std::string& call : recorded_calls::RecordedGlCalls()) {
+            for (const std::string& name : names) {
+                if (call.compare(0, name.size() + 1, name + "(") == 0) kept.push_back(call);
+            }
+        }
+        return kept;
+    }
+
+    static const std::vector<GLfloat> IDENTITY;
+    // glFrustumf(-1, 1, -1, 1, 1, 10): element 11 is -1, element 15 is 0.
+    static const std::vector<GLfloat> PERSPECTIVE;
+    // glOrthof(0, 800, 0, 480, -1, 1).
+    static const std::vector<GLfloat> ORTHO;
+
+    EglSession m_egl;
+};
+
+inline const std::vector<GLfloat> StereoFixture::IDENTITY = {1, 0, 0, 0, 0, 1, 0, 0,
+                                                             0, 0, 1, 0, 0, 0, 0, 1};
+inline const std::vector<GLfloat> StereoFixture::PERSPECTIVE = {
+    1, 0, 0, 0, 0, 1, 0, 0, 0, 0, -11.0f / 9.0f, -1, 0, 0, -20.0f / 9.0f, 0};
+inline const std::vector<GLfloat> StereoFixture::ORTHO = {
+    2.0f / 800, 0, 0, 0, 0, 2.0f / 480, 0, 0, 0, 0, -1, 0, -1, -1, 0, 1};
+
+#endif
