@@ -1,0 +1,58 @@
+# Renders one sample through a capture copy of the library with a stereo profile installed,
+# and on Mesa directly once per eye, where the sample applies the eye's transform itself.
+# The frame at the vendor's swap must equal the two eye images interleaved by column (or,
+# without interleaving, the single reference image).
+#   PROFILE_TOOL PROFILE ROOT LIBRARY_DIR OVO_PROGRAM MESA_PROGRAM FRAMES_TOOL OUTPUT
+#   PROCESS_NAME (optional)  RUN_ARGS  EYE_ARGS (;-lists)  EYE0_COLUMNS (even|odd, or empty)
+#   MASK_STRAY_PIXELS (optional): pixels where Mesa's rasterisation of the mask is known to
+#   leave the column grid; the caller states which and why.
+set(ENV{EGL_PLATFORM} surfaceless)
+file(REMOVE_RECURSE "${OUTPUT}")
+file(MAKE_DIRECTORY "${OUTPUT}" "${ROOT}/sdcard/stereoconv/game")
+
+function(run)
+  execute_process(COMMAND ${ARGN} RESULT_VARIABLE status OUTPUT_VARIABLE out ERROR_VARIABLE err)
+  if(NOT status EQUAL 0)
+    message(FATAL_ERROR "${ARGN}\nfailed (${status}):\n${out}${err}")
+  endif()
+endfunction()
+
+run("${PROFILE_TOOL}" write "${PROFILE}" -o "${ROOT}/sdcard/stereoconv/game/stereo_gm.ovo")
+
+# Through the library, under the process name the profile is meant for.
+set(launcher "")
+if(PROCESS_NAME)
+  set(launcher bash -c "exec -a \"$0\" \"$@\"" "${PROCESS_NAME}")
+endif()
+set(ENV{LD_LIBRARY_PATH} "${LIBRARY_DIR}")
+set(ENV{OVO_SWAP_CAPTURE} "${OUTPUT}/raw.png")
+run(${launcher} "${OVO_PROGRAM}" "${OUTPUT}/own.png" ${RUN_ARGS})
+unset(ENV{LD_LIBRARY_PATH})
+unset(ENV{OVO_SWAP_CAPTURE})
+if(EXISTS "${ROOT}/sdcard/stereoconv/game/stereo_gm.ovo")
+  message(FATAL_ERROR "the library did not take the profile (the file is still there)")
+endif()
+
+if(EYE0_COLUMNS)
+  foreach(eye 0 1)
+    run("${MESA_PROGRAM}" "${OUTPUT}/eye${eye}.png" ${RUN_ARGS} --eye ${eye} ${EYE_ARGS})
+  endforeach()
+  run("${FRAMES_TOOL}" interleave "${OUTPUT}/eye0.png" "${OUTPUT}/eye1.png"
+    --eye0-columns ${EYE0_COLUMNS} -o "${OUTPUT}/expected.png")
+else()
+  run("${MESA_PROGRAM}" "${OUTPUT}/expected.png" ${RUN_ARGS} ${EYE_ARGS})
+endif()
+
+execute_process(COMMAND "${FRAMES_TOOL}" compare "${OUTPUT}/raw.png" "${OUTPUT}/expected.png"
+  RESULT_VARIABLE differ OUTPUT_VARIABLE out ERROR_VARIABLE err)
+if(NOT differ EQUAL 0 AND MASK_STRAY_PIXELS)
+  string(REGEX MATCH "differ: ([0-9]+) pixels" counted "${out}")
+  if(counted AND CMAKE_MATCH_1 LESS_EQUAL MASK_STRAY_PIXELS)
+    message(STATUS "${CMAKE_MATCH_1} stray mask pixels, as measured: ${out}")
+    set(differ 0)
+  endif()
+endif()
+if(NOT differ EQUAL 0)
+  message(FATAL_ERROR "the stereo frame differs from the expected one (${OUTPUT}):\n${out}${err}")
+endif()
+message(STATUS "identical: ${OUTPUT}/raw.png ${OUTPUT}/expected.png")
