@@ -2,6 +2,7 @@
 
 #include <cctype>
 #include <cerrno>
+#include <cmath>
 #include <cstdarg>
 #include <cstdio>
 #include <cstdlib>
@@ -16,6 +17,8 @@ constexpr long SAMPLE_MAX_FRAMES = 10000;
 // Far beyond any phone screen, well within what Mesa's pbuffers take.
 constexpr long SAMPLE_MAX_SIDE = 8192;
 constexpr double SAMPLE_MAX_CPU_SECONDS = 3600.0;
+// Keeps eye distance times depth plane within an int when the sprite shift truncates it.
+constexpr float SAMPLE_MAX_EYE_PARAMETER = 10000.0f;
 
 // A decimal number without sign or spaces at *cursor, within [low, high]; moves the cursor
 // past it.
@@ -30,10 +33,32 @@ bool ParseDecimal(const char** cursor, long low, long high, long* value) {
     return true;
 }
 
-bool ParseFrames(const char* text, SampleArgs* args) {
-    long frames = 0;
-    if (!ParseDecimal(&text, 1, SAMPLE_MAX_FRAMES, &frames) || *text != '\0') return false;
-    args->m_frames = static_cast<int32_t>(frames);
+// A float with |value| <= limit at *cursor; moves the cursor past it.
+bool ParseFloat(const char** cursor, float limit, float* value) {
+    char* end = nullptr;
+    const float parsed = std::strtof(*cursor, &end);
+    if (end == *cursor || std::isspace(static_cast<unsigned char>(**cursor)) ||
+        !(std::fabs(parsed) <= limit)) {
+        return false;
+    }
+    *cursor = end;
+    *value = parsed;
+    return true;
+}
+
+bool ParseWholeFloat(const char* text, float* value) {
+    return ParseFloat(&text, SAMPLE_MAX_EYE_PARAMETER, value) && *text == '\0';
+}
+
+// "A,B", both above zero.
+bool ParsePositivePair(const char* text, float* first, float* second) {
+    float a = 0.0f;
+    float b = 0.0f;
+    if (!ParseFloat(&text, SAMPLE_MAX_SIDE, &a) || *text++ != ',') return false;
+    if (!ParseFloat(&text, SAMPLE_MAX_SIDE, &b) || *text != '\0') return false;
+    if (!(a > 0.0f && b > 0.0f)) return false;
+    *first = a;
+    *second = b;
     return true;
 }
 
@@ -44,6 +69,13 @@ bool ParsePixelSize(const char* text, PixelSize* size) {
     if (!ParseDecimal(&text, 1, SAMPLE_MAX_SIDE, &width) || *text++ != 'x') return false;
     if (!ParseDecimal(&text, 1, SAMPLE_MAX_SIDE, &height) || *text != '\0') return false;
     *size = {static_cast<int32_t>(width), static_cast<int32_t>(height)};
+    return true;
+}
+
+bool ParseFrames(const char* text, SampleArgs* args) {
+    long frames = 0;
+    if (!ParseDecimal(&text, 1, SAMPLE_MAX_FRAMES, &frames) || *text != '\0') return false;
+    args->m_frames = static_cast<int32_t>(frames);
     return true;
 }
 
@@ -63,24 +95,76 @@ bool ParseCpuSeconds(const char* text, SampleArgs* args) {
     return true;
 }
 
+bool ParseEye(const char* text, SampleArgs* args) {
+    if (std::strcmp(text, "0") != 0 && std::strcmp(text, "1") != 0) return false;
+    args->m_reference.m_eye = text[0] - '0';
+    return true;
+}
+
+bool ParseEyeDistance(const char* text, SampleArgs* args) {
+    return ParseWholeFloat(text, &args->m_reference.m_eye_distance);
+}
+
+bool ParseEyeAngle(const char* text, SampleArgs* args) {
+    return ParseWholeFloat(text, &args->m_reference.m_eye_angle);
+}
+
+bool ParseEyeShift(const char* text, SampleArgs* args) {
+    return ParseWholeFloat(text, &args->m_reference.m_eye_shift);
+}
+
+bool ParseOverlay(const char* text, SampleArgs* args) {
+    ReferenceOptions& reference = args->m_reference;
+    reference.m_overlay =
+        ParsePositivePair(text, &reference.m_overlay_width, &reference.m_overlay_height);
+    return reference.m_overlay;
+}
+
+bool ParseViewportScale(const char* text, SampleArgs* args) {
+    ReferenceOptions& reference = args->m_reference;
+    reference.m_viewport_scaled =
+        ParsePositivePair(text, &reference.m_scale_x, &reference.m_scale_y);
+    return reference.m_viewport_scaled;
+}
+
+// How an option goes with --eye.
+enum class EyeRule { ANY, NEEDS_EYE, WITHOUT_EYE };
+
 struct SampleOption {
     const char* m_name;
     const char* m_value;
     const char* m_help;
     bool (*m_parse)(const char* text, SampleArgs* args);
+    uint32_t m_offered_by;  // REFERENCE_OPTION_... flag; 0: every sample
+    EyeRule m_eye_rule;
 };
 
 const SampleOption SAMPLE_OPTIONS[] = {
-    {"--frames", "N", "frames to draw, 1 to 10000 (default 3)", ParseFrames},
-    {"--size", "WxH", "pbuffer size, sides 1 to 8192 (default 320x240)", ParseSize},
-    {"--game-size", "WxH", "size the game renders at (default: --size)", ParseGameSize},
+    {"--frames", "N", "frames to draw, 1 to 10000 (default 3)", ParseFrames, 0, EyeRule::ANY},
+    {"--size", "WxH", "pbuffer size, sides 1 to 8192 (default 320x240)", ParseSize, 0,
+     EyeRule::ANY},
+    {"--game-size", "WxH", "size the game renders at (default: --size)", ParseGameSize, 0,
+     EyeRule::ANY},
     {"--cpu-seconds", "S", "draw until S seconds of processor time are used, then at least "
-                           "--frames frames", ParseCpuSeconds},
+     "--frames frames", ParseCpuSeconds, 0, EyeRule::ANY},
+    {"--eye", "0|1", "render this eye of the stereo pair", ParseEye, REFERENCE_OPTION_EYE,
+     EyeRule::ANY},
+    {"--eye-distance", "D", "eye offset of perspective draws (default 0)", ParseEyeDistance,
+     REFERENCE_OPTION_EYE, EyeRule::NEEDS_EYE},
+    {"--eye-angle", "A", "image offset of perspective draws (default 0)", ParseEyeAngle,
+     REFERENCE_OPTION_EYE, EyeRule::NEEDS_EYE},
+    {"--eye-shift", "S", "shift of flat draws (default 0)", ParseEyeShift, REFERENCE_OPTION_EYE,
+     EyeRule::NEEDS_EYE},
+    {"--overlay-reference", "W,H", "HUD through a texture, composed into two W x H halves",
+     ParseOverlay, REFERENCE_OPTION_OVERLAY, EyeRule::NEEDS_EYE},
+    {"--viewport-scale", "SX,SY", "scale every viewport the game sets", ParseViewportScale,
+     REFERENCE_OPTION_VIEWPORT_SCALE, EyeRule::WITHOUT_EYE},
 };
 
-const SampleOption* FindOption(const char* name) {
+const SampleOption* FindOption(const SampleInfo& info, const char* name) {
     for (const SampleOption& option : SAMPLE_OPTIONS) {
-        if (std::strcmp(name, option.m_name) == 0) return &option;
+        const bool offered = (option.m_offered_by & ~info.m_reference_options) == 0;
+        if (offered && std::strcmp(name, option.m_name) == 0) return &option;
     }
     return nullptr;
 }
@@ -94,6 +178,7 @@ bool Fail(const SampleInfo& info, const char* format, ...) {
     va_end(arguments);
     std::fprintf(stderr, "\nusage: %s OUTPUT.png [OPTION VALUE]...\n", info.m_program);
     for (const SampleOption& option : SAMPLE_OPTIONS) {
+        if ((option.m_offered_by & ~info.m_reference_options) != 0) continue;
         char syntax[64];
         std::snprintf(syntax, sizeof(syntax), "%s %s", option.m_name, option.m_value);
         std::fprintf(stderr, "  %-28s %s\n", syntax, option.m_help);
@@ -105,6 +190,8 @@ bool Fail(const SampleInfo& info, const char* format, ...) {
 
 bool ParseSampleArgs(const SampleInfo& info, int argc, char** argv, SampleArgs* args) {
     bool game_size_given = false;
+    const SampleOption* needs_eye = nullptr;
+    const SampleOption* without_eye = nullptr;
     for (int i = 1; i < argc; ++i) {
         const char* word = argv[i];
         if (word[0] != '-') {
@@ -112,14 +199,22 @@ bool ParseSampleArgs(const SampleInfo& info, int argc, char** argv, SampleArgs* 
             args->m_output = word;
             continue;
         }
-        const SampleOption* option = FindOption(word);
+        const SampleOption* option = FindOption(info, word);
         if (option == nullptr) return Fail(info, "unknown option '%s'", word);
         if (i + 1 == argc) return Fail(info, "no value after %s", word);
         const char* value = argv[++i];
         if (!option->m_parse(value, args)) return Fail(info, "bad value '%s' for %s", value, word);
         game_size_given = game_size_given || option->m_parse == ParseGameSize;
+        if (option->m_eye_rule == EyeRule::NEEDS_EYE) needs_eye = option;
+        if (option->m_eye_rule == EyeRule::WITHOUT_EYE) without_eye = option;
     }
     if (args->m_output == nullptr) return Fail(info, "no output file");
+    const bool eye = args->m_reference.HasEye();
+    if (needs_eye != nullptr && !eye) return Fail(info, "%s needs --eye", needs_eye->m_name);
+    if (without_eye != nullptr && eye) {
+        return Fail(info, "%s draws the one scaled image; it does not go with --eye",
+                    without_eye->m_name);
+    }
     if (!game_size_given) args->m_game_size = args->m_size;
     return true;
 }

@@ -3,6 +3,8 @@
 
 #include <cstdint>
 
+#include "common/reference_options.h"
+
 namespace ovo_sample {
 
 constexpr int32_t SAMPLE_DEFAULT_FRAMES = 3;
@@ -21,6 +23,8 @@ struct PixelSize {
 struct SampleInfo {
     const char* m_program;
     int32_t m_client_version;
+    // REFERENCE_OPTION_... flags: the reference renderings the sample can make.
+    uint32_t m_reference_options = 0;
 };
 
 struct SampleArgs {
@@ -32,11 +36,12 @@ struct SampleArgs {
     PixelSize m_size = {SAMPLE_DEFAULT_WIDTH, SAMPLE_DEFAULT_HEIGHT};
     // The size the game believes it renders at: its viewport, aspect and HUD layout.
     PixelSize m_game_size = {SAMPLE_DEFAULT_WIDTH, SAMPLE_DEFAULT_HEIGHT};
+    ReferenceOptions m_reference;
 };
 
-// `PROGRAM OUTPUT.png [--frames N] [--size WxH] [--game-size WxH] [--cpu-seconds S]`; the
-// game size follows --size unless given. On a bad command line prints what is wrong and the
-// usage, and answers false.
+// `PROGRAM OUTPUT.png [--frames N] [--size WxH] [--game-size WxH] [--cpu-seconds S]` and
+// the reference options that `info` offers; the game size follows --size unless given. On a
+// bad command line prints what is wrong and the usage, and answers false.
 bool ParseSampleArgs(const SampleInfo& info, int argc, char** argv, SampleArgs* args);
 
 }  // namespace ovo_sample

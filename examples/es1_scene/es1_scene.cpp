@@ -2,6 +2,8 @@
 
 #include <cmath>
 
+#include "common/eye_projection.h"
+#include "common/game_viewport.h"
 #include "common/gl_texture.h"
 #include "common/rgba_image.h"
 #include "es1_scene/cube_draw.h"
@@ -48,18 +50,19 @@ constexpr Crate CRATES[] = {
 
 }  // namespace
 
-bool Es1Scene::Init(const char* /*program*/, int32_t width, int32_t height) {
+bool Es1Scene::Init(const char* program, int32_t width, int32_t height) {
     m_width = width;
     m_height = height;
     BuildFloor();
     const RgbaImage crate = MakeCheckerboard(CRATE_TEXTURE_SIZE, CRATE_CHECKER_CELL,
                                              {200, 150, 90, 255}, {130, 85, 45, 255});
     m_crate_texture = CreateTexture(crate, {GL_LINEAR, GL_LINEAR, GL_REPEAT, GL_REPEAT});
-    m_hud.Init(width, height);
-    return true;
+    m_hud.Init(width, height, m_reference);
+    return !m_reference.m_overlay || m_overlay.Create(program, m_surface);
 }
 
 void Es1Scene::Release() {
+    m_overlay.Release();
     m_hud.Release();
     DeleteTexture(&m_crate_texture);
 }
@@ -89,7 +92,7 @@ void Es1Scene::BuildFloor() {
 }
 
 void Es1Scene::DrawFrame(int32_t frame) {
-    glViewport(0, 0, m_width, m_height);
+    SetGameViewport(m_reference, 0, 0, m_width, m_height);
     glClearColor(SKY[0], SKY[1], SKY[2], SKY[3]);
     glClear(GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT);
 
@@ -108,7 +111,18 @@ void Es1Scene::DrawFrame(int32_t frame) {
     DrawCrates(frame);
     DrawTower(frame);
 
+    DrawHud(frame);
+}
+
+void Es1Scene::DrawHud(int32_t frame) const {
+    if (!m_reference.m_overlay) {
+        m_hud.Draw(frame);
+        return;
+    }
+    m_overlay.Begin();
     m_hud.Draw(frame);
+    m_overlay.End();
+    m_overlay.ComposeStereo(m_reference);
 }
 
 void Es1Scene::SetUpPerspective() const {
@@ -117,6 +131,7 @@ void Es1Scene::SetUpPerspective() const {
     glMatrixMode(GL_PROJECTION);
     glLoadIdentity();
     glFrustumf(-right, right, -top, top, VIEW_NEAR, VIEW_FAR);
+    LoadEyePerspective(m_reference);
 
     glMatrixMode(GL_MODELVIEW);
     glLoadIdentity();

@@ -2,6 +2,7 @@
 
 #include <cmath>
 
+#include "common/eye_projection.h"
 #include "common/gl_texture.h"
 #include "common/rgba_image.h"
 
@@ -37,7 +38,8 @@ void DrawTexturedRect(float x, float y, float size) {
 
 }  // namespace
 
-void Hud::Init(int32_t width, int32_t height) {
+void Hud::Init(int32_t width, int32_t height, const ReferenceOptions& reference) {
+    m_reference = reference;
     m_width = width;
     m_height = height;
     const RgbaImage icon =
@@ -53,6 +55,8 @@ void Hud::Draw(int32_t frame) const {
     glLoadIdentity();
     glOrthof(0.0f, static_cast<GLfloat>(m_width), 0.0f, static_cast<GLfloat>(m_height), -1.0f,
              1.0f);
+    // An overlay target takes the HUD unshifted; its composition gives the HUD its depth.
+    if (!m_reference.m_overlay) LoadEyeFlat(m_reference);
     glMatrixMode(GL_MODELVIEW);
     glLoadIdentity();
 

@@ -18,25 +18,25 @@ void EndSprites() {
     glDisable(GL_TEXTURE_2D);
 }
 
-void DrawQuad(GLuint texture, GLfloat x, GLfloat y, GLfloat width, GLfloat height,
-              const TexRect& uv) {
+void DrawQuad(SpriteEyeReference* draws, GLuint texture, GLfloat x, GLfloat y, GLfloat width,
+              GLfloat height, const TexRect& uv) {
     const GLfloat positions[] = {x, y, x, y + height, x + width, y, x + width, y + height};
     const GLfloat coords[] = {uv.m_s0, uv.m_t1, uv.m_s0, uv.m_t0,
                               uv.m_s1, uv.m_t1, uv.m_s1, uv.m_t0};
     glBindTexture(GL_TEXTURE_2D, texture);
     glVertexPointer(2, GL_FLOAT, 0, positions);
     glTexCoordPointer(2, GL_FLOAT, 0, coords);
-    glDrawArrays(GL_TRIANGLE_STRIP, 0, QUAD_VERTICES);
+    draws->DrawArrays(GL_TRIANGLE_STRIP, 0, QUAD_VERTICES);
 }
 
-void DrawSprite(GLuint texture, GLfloat x, GLfloat y, GLfloat width, GLfloat height,
-                GLfloat degrees) {
+void DrawSprite(SpriteEyeReference* draws, GLuint texture, GLfloat x, GLfloat y,
+                GLfloat width, GLfloat height, GLfloat degrees) {
     glPushMatrix();
     glTranslatef(x, y, 0.0f);
     // y points down, so a positive turn about +z is clockwise on screen.
     glRotatef(degrees, 0.0f, 0.0f, 1.0f);
     glScalef(width, height, 1.0f);
-    DrawQuad(texture, -0.5f, -0.5f, 1.0f, 1.0f, WHOLE_TEXTURE);
+    DrawQuad(draws, texture, -0.5f, -0.5f, 1.0f, 1.0f, WHOLE_TEXTURE);
     glPopMatrix();
 }
 

@@ -2,6 +2,7 @@
 
 #include <cmath>
 
+#include "common/game_viewport.h"
 #include "common/gl_texture.h"
 #include "es1_sprites/sprite_draw.h"
 #include "es1_sprites/sprite_images.h"
@@ -88,7 +89,7 @@ void SpriteScene::Release() {
 }
 
 void SpriteScene::DrawFrame(int32_t frame) {
-    glViewport(0, 0, m_width, m_height);
+    SetGameViewport(m_reference, 0, 0, m_width, m_height);
     glClearColor(0.0f, 0.0f, 0.0f, 1.0f);
     glClear(GL_COLOR_BUFFER_BIT);
 
@@ -103,6 +104,7 @@ void SpriteScene::DrawFrame(int32_t frame) {
     glDisable(GL_CULL_FACE);
     glTexEnvf(GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, GL_MODULATE);
 
+    m_draws.StartFrame();
     BeginSprites();
     DrawBackground(frame);
     DrawLevel();
@@ -112,67 +114,69 @@ void SpriteScene::DrawFrame(int32_t frame) {
     DrawScoreBar();
 }
 
-void SpriteScene::DrawBackground(int32_t frame) const {
+void SpriteScene::DrawBackground(int32_t frame) {
     const GLfloat width = static_cast<GLfloat>(m_width);
     glDisable(GL_BLEND);
     glColor4f(1.0f, 1.0f, 1.0f, 1.0f);
-    DrawQuad(m_textures[TEXTURE_SKY], 0.0f, 0.0f, width, FLOOR_TOP, WHOLE_TEXTURE);
+    DrawQuad(&m_draws, m_textures[TEXTURE_SKY], 0.0f, 0.0f, width, FLOOR_TOP, WHOLE_TEXTURE);
 
     glEnable(GL_BLEND);
     glBlendFunc(GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
     // Scrolling moves the texture coordinates; the quads stay put.
     const GLfloat repeats = width / HILLS_TEXTURE_WIDTH;
     const GLfloat far_s = FAR_SCROLL * frame / HILLS_TEXTURE_WIDTH;
-    DrawQuad(m_textures[TEXTURE_FAR_HILLS], 0.0f, FAR_HILLS_TOP, width, HILLS_HEIGHT,
-             {far_s, 0.0f, far_s + repeats, 1.0f});
+    DrawQuad(&m_draws, m_textures[TEXTURE_FAR_HILLS], 0.0f, FAR_HILLS_TOP, width,
+             HILLS_HEIGHT, {far_s, 0.0f, far_s + repeats, 1.0f});
 
     for (const Cloud& cloud : CLOUDS) {
         glColor4f(1.0f, 1.0f, 1.0f, cloud.m_alpha);
         const GLfloat x = std::fmod(cloud.m_x - CLOUD_DRIFT * frame + width, width);
-        DrawQuad(m_textures[TEXTURE_CLOUD], x - cloud.m_width * 0.5f, cloud.m_y,
+        DrawQuad(&m_draws, m_textures[TEXTURE_CLOUD], x - cloud.m_width * 0.5f, cloud.m_y,
                  cloud.m_width, cloud.m_width * 0.45f, WHOLE_TEXTURE);
     }
     glColor4f(1.0f, 1.0f, 1.0f, 1.0f);
 
     const GLfloat near_s = NEAR_SCROLL * frame / HILLS_TEXTURE_WIDTH;
-    DrawQuad(m_textures[TEXTURE_NEAR_HILLS], 0.0f, NEAR_HILLS_TOP, width, HILLS_HEIGHT,
-             {near_s, 0.0f, near_s + repeats, 1.0f});
+    DrawQuad(&m_draws, m_textures[TEXTURE_NEAR_HILLS], 0.0f, NEAR_HILLS_TOP, width,
+             HILLS_HEIGHT, {near_s, 0.0f, near_s + repeats, 1.0f});
 }
 
-void SpriteScene::DrawLevel() const {
+void SpriteScene::DrawLevel() {
     // Tile by tile, column by column, as a tile map draws: grass, brick, grass, ...
     glDisable(GL_BLEND);
     for (GLfloat x = 0.0f; x < m_width; x += TILE) {
-        DrawQuad(m_textures[TEXTURE_GRASS], x, FLOOR_TOP, TILE, TILE, WHOLE_TEXTURE);
-        DrawQuad(m_textures[TEXTURE_BRICK], x, FLOOR_TOP + TILE, TILE, TILE, WHOLE_TEXTURE);
+        DrawQuad(&m_draws, m_textures[TEXTURE_GRASS], x, FLOOR_TOP, TILE, TILE, WHOLE_TEXTURE);
+        DrawQuad(&m_draws, m_textures[TEXTURE_BRICK], x, FLOOR_TOP + TILE, TILE, TILE,
+                 WHOLE_TEXTURE);
     }
     glEnable(GL_BLEND);
     for (int32_t i = 0; i < 4; ++i) {
-        DrawQuad(m_textures[TEXTURE_BRICK], 192.0f + TILE * i, 120.0f, TILE, TILE * 0.5f,
-                 {0.0f, 0.5f, 1.0f, 1.0f});
+        DrawQuad(&m_draws, m_textures[TEXTURE_BRICK], 192.0f + TILE * i, 120.0f, TILE,
+                 TILE * 0.5f, {0.0f, 0.5f, 1.0f, 1.0f});
     }
 }
 
-void SpriteScene::DrawActors(int32_t frame) const {
+void SpriteScene::DrawActors(int32_t frame) {
     for (int32_t i = 0; i < static_cast<int32_t>(sizeof(ACTORS) / sizeof(ACTORS[0])); ++i) {
         const Actor& actor = ACTORS[i];
         glColor4f(actor.m_tint[0], actor.m_tint[1], actor.m_tint[2], 1.0f);
         if (actor.m_enemy) {
-            DrawSprite(m_textures[TEXTURE_STAR], actor.m_x, actor.m_y, 28.0f, 28.0f,
-                       12.0f * frame + 40.0f * i);
+            DrawSprite(&m_draws, m_textures[TEXTURE_STAR], actor.m_x, actor.m_y, 28.0f,
+                       28.0f, 12.0f * frame + 40.0f * i);
         } else {
             // A spinning coin narrows and widens.
             const GLfloat turn = std::fabs(std::cos(0.5f * frame + 0.7f * i));
-            DrawSprite(m_textures[TEXTURE_COIN], actor.m_x, actor.m_y, 4.0f + 16.0f * turn,
-                       20.0f, 0.0f);
+            DrawSprite(&m_draws, m_textures[TEXTURE_COIN], actor.m_x, actor.m_y,
+                       4.0f + 16.0f * turn, 20.0f, 0.0f);
         }
     }
     glColor4f(1.0f, 1.0f, 1.0f, 1.0f);
     const GLfloat bob = 3.0f * std::sin(0.8f * frame);
-    DrawSprite(m_textures[TEXTURE_PLAYER], PLAYER_X, PLAYER_Y + bob, 32.0f, 32.0f, -8.0f);
+    DrawSprite(&m_draws, m_textures[TEXTURE_PLAYER], PLAYER_X, PLAYER_Y + bob, 32.0f, 32.0f,
+               -8.0f);
 }
 
-void SpriteScene::DrawSparks(int32_t frame) const {
+void SpriteScene::DrawSparks(int32_t frame) {
     // Light adds up: sparks brighten what is behind them.
     glBlendFunc(GL_SRC_ALPHA, GL_ONE);
     for (int32_t i = 0; i < SPARK_COUNT; ++i) {
@@ -180,14 +184,14 @@ void SpriteScene::DrawSparks(int32_t frame) const {
         const GLfloat radius = 10.0f + 2.2f * i;
         const GLfloat fade = 1.0f - static_cast<GLfloat>(i) / SPARK_COUNT;
         glColor4f(1.0f, 0.8f, 0.5f, 0.9f * fade);
-        DrawSprite(m_textures[TEXTURE_GLOW], PLAYER_X + radius * std::cos(angle),
+        DrawSprite(&m_draws, m_textures[TEXTURE_GLOW], PLAYER_X + radius * std::cos(angle),
                    PLAYER_Y - 6.0f + radius * std::sin(angle) * 0.6f, 10.0f, 10.0f, 0.0f);
     }
     glBlendFunc(GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
     glColor4f(1.0f, 1.0f, 1.0f, 1.0f);
 }
 
-void SpriteScene::DrawScoreBar() const {
+void SpriteScene::DrawScoreBar() {
     // Untextured see-through bar, then the lives as small player icons on top.
     glEnable(GL_BLEND);
     glBlendFunc(GL_SRC_ALPHA, GL_ONE_MINUS_SRC_ALPHA);
@@ -196,18 +200,19 @@ void SpriteScene::DrawScoreBar() const {
     glEnableClientState(GL_VERTEX_ARRAY);
     glVertexPointer(2, GL_FLOAT, 0, bar);
     glColor4f(0.0f, 0.0f, 0.0f, 0.5f);
-    glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
+    // Untextured, yet on the plane of the texture still bound from the sprites.
+    m_draws.DrawArrays(GL_TRIANGLE_STRIP, 0, 4);
     glDisableClientState(GL_VERTEX_ARRAY);
 
     glColor4f(1.0f, 1.0f, 1.0f, 1.0f);
     BeginSprites();
     for (int32_t life = 0; life < 3; ++life) {
-        DrawQuad(m_textures[TEXTURE_PLAYER], 4.0f + 18.0f * life, 2.0f, 16.0f, 16.0f,
+        DrawQuad(&m_draws, m_textures[TEXTURE_PLAYER], 4.0f + 18.0f * life, 2.0f, 16.0f, 16.0f,
                  WHOLE_TEXTURE);
     }
     for (int32_t coin = 0; coin < 5; ++coin) {
-        DrawQuad(m_textures[TEXTURE_COIN], width - 20.0f - 14.0f * coin, 4.0f, 12.0f, 12.0f,
-                 WHOLE_TEXTURE);
+        DrawQuad(&m_draws, m_textures[TEXTURE_COIN], width - 20.0f - 14.0f * coin, 4.0f, 12.0f,
+                 12.0f, WHOLE_TEXTURE);
     }
     EndSprites();
     glDisable(GL_BLEND);
