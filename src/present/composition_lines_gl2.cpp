@@ -11,10 +11,11 @@ namespace ovo {
 
 namespace {
 
-constexpr char COMPOSITION_VERTEX_SOURCE[] =
-    "attribute vec4 myVertex;uniform mat4 myPMVMatrix;void main(void){\tgl_Position = myPMVMatrix * myVertex;}";
-constexpr char COMPOSITION_FRAGMENT_SOURCE[] =
-    "uniform mediump vec4 color;void main (void){\tgl_FragColor = color;}";
+// Each a one-string list that lives as long as the process, as glShaderSource takes it.
+constexpr const char* COMPOSITION_VERTEX_SOURCE[] = {
+    "attribute vec4 myVertex;uniform mat4 myPMVMatrix;void main(void){\tgl_Position = myPMVMatrix * myVertex;}"};
+constexpr const char* COMPOSITION_FRAGMENT_SOURCE[] = {
+    "uniform mediump vec4 color;void main (void){\tgl_FragColor = color;}"};
 
 // Positions in COMPOSITION_GL2_SAVED.
 enum CompositionGl2Saved : uint8_t {
@@ -66,9 +67,9 @@ constexpr GlStateItem COMPOSITION_GL2_DISABLED[] = {
     {GL_STATE_ENABLE, GL_DEPTH_TEST, true, {0}},
 };
 
-GLuint CompileShader(GLenum type, const char* source) {
+GLuint CompileShader(GLenum type, const char* const* source) {
     GLuint shader = raw::glCreateShader(type);
-    raw::glShaderSource(shader, 1, &source, nullptr);
+    raw::glShaderSource(shader, 1, source, nullptr);
     raw::glCompileShader(shader);
     return shader;
 }

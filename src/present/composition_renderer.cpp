@@ -103,7 +103,8 @@ void CompositionRenderer::BuildLinesGl2(const StereoProfileFields& profile) {
             line[1] = 0.0f;
             line[3] = height;
         } else {
-            // Off the pixel's edge, so that rounding cannot move a line to the next column.
+            // A thousandth of a pixel right of the column edge. Rasterisers with coarse
+            // sub-pixel precision (llvmpipe) snap it back onto the edge.
             line[0] = line[2] = static_cast<float>(2 * i) + 0.001f;
             line[1] = 480.0f;
             line[3] = 0.0f;
