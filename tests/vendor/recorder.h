@@ -4,12 +4,14 @@
 // The recording vendor driver: EGL, OpenGL ES 1.x and 2.0 libraries built from the
 // library's own entry tables. Every call is recorded with the index of the function that
 // received it and its arguments as bits, and answers a result derived from that index,
-// so a test can tell exactly which vendor function a call reached.
+// so a test can tell exactly which vendor function a call reached. A test can also give
+// a GL function answers: values written through its output pointer, or its result.
 
 #include <EGL/egl.h>
 
 #include <cstdint>
 #include <cstring>
+#include <tuple>
 #include <type_traits>
 
 enum RecorderApi : int32_t {
@@ -23,12 +25,34 @@ constexpr uint32_t RECORDER_MAX_ARGUMENTS = 16;
 constexpr uint32_t RECORDER_CAPACITY = 256;
 constexpr uint32_t RECORDER_ATTRIBUTE_CAPACITY = 64;
 constexpr uint32_t RECORDER_GL_NAMES = 376;
+constexpr uint32_t RECORDER_ANSWER_CAPACITY = 64;
+constexpr uint32_t RECORDER_ANSWER_BYTES = 64;  // a 4x4 float matrix
+
+// How an argument's bits read back.
+enum RecorderArgumentKind : uint8_t {
+    RECORDER_ARGUMENT_SIGNED = 0,
+    RECORDER_ARGUMENT_UNSIGNED = 1,
+    RECORDER_ARGUMENT_FLOAT = 2,
+    RECORDER_ARGUMENT_POINTER = 3,
+};
 
 struct RecordedCall {
     int32_t m_api;
     uint32_t m_index;
     uint32_t m_argument_count;
     uint64_t m_arguments[RECORDER_MAX_ARGUMENTS];
+    uint8_t m_kinds[RECORDER_MAX_ARGUMENTS];  // RecorderArgumentKind
+};
+
+// What a GL function answers when its last non-pointer argument (the pname, the capability,
+// the program) equals m_key.
+struct RecorderAnswer {
+    uint32_t m_index;
+    uint64_t m_key;
+    uint32_t m_byte_count;                 // copied through a last pointer-to-non-const argument
+    uint8_t m_bytes[RECORDER_ANSWER_BYTES];
+    bool m_has_result;
+    uint64_t m_result;                     // returned by a function with an integer result
 };
 
 struct RecorderState {
@@ -42,6 +66,8 @@ struct RecorderState {
     EGLint m_surface_height;
     EGLint m_chosen_attributes[RECORDER_ATTRIBUTE_CAPACITY];  // last eglChooseConfig list
     bool m_resolver_knows[RECORDER_GL_NAMES];                  // GL names the resolver answers
+    uint32_t m_answer_count;
+    RecorderAnswer m_answers[RECORDER_ANSWER_CAPACITY];
 };
 
 extern "C" RecorderState* RecorderGetState();
@@ -76,6 +102,48 @@ uint64_t ArgumentBits(Value value) {
     }
 }
 
+template <typename Value>
+constexpr uint8_t ArgumentKind() {
+    if constexpr (std::is_pointer_v<Value>) {
+        return RECORDER_ARGUMENT_POINTER;
+    } else if constexpr (std::is_floating_point_v<Value>) {
+        return RECORDER_ARGUMENT_FLOAT;
+    } else if constexpr (std::is_signed_v<Value>) {
+        return RECORDER_ARGUMENT_SIGNED;
+    } else {
+        return RECORDER_ARGUMENT_UNSIGNED;
+    }
+}
+
+inline const RecorderAnswer* FindAnswer(const RecorderState& state, uint32_t index, uint64_t key) {
+    for (uint32_t i = 0; i < state.m_answer_count; ++i) {
+        const RecorderAnswer& answer = state.m_answers[i];
+        if (answer.m_index == index && answer.m_key == key) return &answer;
+    }
+    return nullptr;
+}
+
+// The answer for a GL call, written through its last argument when that is a pointer to
+// something writable; null when the test gave none.
+template <typename... Arguments>
+const RecorderAnswer* GiveAnswer(uint32_t index, Arguments... arguments) {
+    const RecorderState& state = *RecorderGetState();
+    if (state.m_answer_count == 0) return nullptr;
+    uint64_t key = 0;
+    ((key = std::is_pointer_v<Arguments> ? key : ArgumentBits(arguments)), ...);
+    const RecorderAnswer* answer = FindAnswer(state, index, key);
+    if constexpr (sizeof...(Arguments) > 0) {
+        using Last = std::tuple_element_t<sizeof...(Arguments) - 1, std::tuple<Arguments...>>;
+        if constexpr (std::is_pointer_v<Last> && !std::is_const_v<std::remove_pointer_t<Last>>) {
+            Last destination = std::get<sizeof...(Arguments) - 1>(std::make_tuple(arguments...));
+            if (answer != nullptr && destination != nullptr) {
+                std::memcpy(destination, answer->m_bytes, answer->m_byte_count);
+            }
+        }
+    }
+    return answer;
+}
+
 template <int32_t API, uint32_t INDEX, typename Result, typename... Arguments>
 Result RecordCall(Arguments... arguments) {
     RecorderState& state = *RecorderGetState();
@@ -85,7 +153,16 @@ Result RecordCall(Arguments... arguments) {
         call.m_index = INDEX;
         call.m_argument_count = sizeof...(Arguments);
         uint32_t position = 0;
-        ((call.m_arguments[position++] = ArgumentBits(arguments)), ...);
+        ((call.m_kinds[position] = ArgumentKind<Arguments>(),
+          call.m_arguments[position++] = ArgumentBits(arguments)),
+         ...);
+    }
+    if constexpr (API != RECORDER_API_EGL) {
+        const RecorderAnswer* answer = GiveAnswer(INDEX, arguments...);
+        static_cast<void>(answer);  // unused by functions without a result
+        if constexpr (!std::is_void_v<Result> && !std::is_pointer_v<Result>) {
+            if (answer != nullptr && answer->m_has_result) return static_cast<Result>(answer->m_result);
+        }
     }
     return RecorderResult<Result>(API, INDEX);
 }
