@@ -163,41 +163,47 @@ const Command COMMANDS[] = {
 
 bool IsHelp(const char* argument) { return std::strcmp(argument, "--help") == 0 || std::strcmp(argument, "-h") == 0; }
 
-// `argument` is the option `name`, given as "NAME VALUE" or "NAME=VALUE": points `value`
-// at the value and steps `index` past it. A missing value leaves `value` null.
-bool TakeOption(const char* name, int argc, char** argv, int* index, const char** value) {
-    const char* argument = argv[*index];
-    const size_t length = std::strlen(name);
-    if (std::strncmp(argument, name, length) != 0) return false;
-    if (argument[length] == '=') {
-        *value = argument + length + 1;
-        return true;
+struct Option {
+    const char* m_name;
+    const char* Arguments::*m_value;
+    // Offered by the commands that make a frame, or by the others.
+    bool m_makes_frame;
+};
+
+const Option OPTIONS[] = {
+    {"-o", &Arguments::m_output, true},
+    {"--output", &Arguments::m_output, true},
+    {"--eye0-columns", &Arguments::m_eye0_columns, true},
+    {"--tolerance", &Arguments::m_tolerance, false},
+};
+
+// The option of `command` that `argument` names, as "NAME" or "NAME=VALUE" (then `value`
+// points at VALUE); null when there is none.
+const Option* FindOption(const Command& command, const char* argument, const char** value) {
+    for (const Option& option : OPTIONS) {
+        if (option.m_makes_frame != command.m_makes_frame) continue;
+        const size_t length = std::strlen(option.m_name);
+        if (std::strncmp(argument, option.m_name, length) != 0) continue;
+        if (argument[length] == '=') *value = argument + length + 1;
+        if (argument[length] == '=' || argument[length] == '\0') return &option;
     }
-    if (argument[length] != '\0') return false;
-    *value = *index + 1 < argc ? argv[++*index] : nullptr;
-    return true;
+    return nullptr;
 }
 
 // Returns 0 when `arguments` holds a complete command line for `command`.
 int ParseArguments(const Command& command, int argc, char** argv, Arguments* arguments) {
     for (int index = 0; index < argc; ++index) {
         const char* argument = argv[index];
-        const char** value = nullptr;
-        const char* option = argument;
-        if (command.m_makes_frame && (TakeOption("-o", argc, argv, &index, &arguments->m_output) ||
-                                      TakeOption("--output", argc, argv, &index, &arguments->m_output))) {
-            value = &arguments->m_output;
-        } else if (command.m_makes_frame &&
-                   TakeOption("--eye0-columns", argc, argv, &index, &arguments->m_eye0_columns)) {
-            value = &arguments->m_eye0_columns;
-        } else if (!command.m_makes_frame && TakeOption("--tolerance", argc, argv, &index, &arguments->m_tolerance)) {
-            value = &arguments->m_tolerance;
-        } else if (argument[0] == '-' && argument[1] != '\0') {
-            return UsageError(argument, std::string("unknown option of ") + command.m_name);
-        } else {
+        if (argument[0] != '-' || argument[1] == '\0') {
             arguments->m_files.push_back(argument);
+            continue;
         }
-        if (value != nullptr && (*value == nullptr || **value == '\0')) return UsageError(option, "needs a value");
+        const char* value = nullptr;
+        const Option* option = FindOption(command, argument, &value);
+        if (option == nullptr) return UsageError(argument, std::string("unknown option of ") + command.m_name);
+        if (value == nullptr && index + 1 < argc) value = argv[++index];
+        if (value == nullptr || value[0] == '\0') return UsageError(option->m_name, "needs a value");
+        arguments->*(option->m_value) = value;
     }
     if (arguments->m_files.size() != command.m_file_count) {
         return UsageError(command.m_name, command.m_file_count == 1 ? "takes one image" : "takes two images");
