@@ -1,9 +1,25 @@
 #!/usr/bin/env bash
 # Builds the library and renders every sample program through it (with the host's Mesa as
-# the vendor) and, for comparison, on Mesa directly. Then renders samples again with each
+# the vendor) and, for comparison, on Mesa directly. Then renders every sample with every
 # example stereo profile installed, as the companion application installs one before a
-# game starts. The images go to out/demo/.
+# game starts, through a copy of the library whose vendor EGL writes out the frame at each
+# swap, exactly as the panel receives it. An interleaved frame is also shown side by side
+# and as a red-cyan anaglyph. The images go to out/demo/.
 set -euo pipefail
+
+# The columns eye 0 lands on: how Mesa (llvmpipe) rasterises the lines of the stencil mask.
+eye0_columns=odd
+# Processor time per run with a profile: the panel refresh comes round every 0.1 s of it.
+cpu_seconds=0.5
+# profile -> the one sample it is made for; a profile not named here goes with every sample.
+declare -A profile_sample=([es1_scene_interleave]=es1_scene [es1_scene_overlay]=es1_scene
+  [es1_sprites_listed]=es1_sprites)
+# profile -> the options its sample needs with it.
+declare -A profile_options=([es1_scene_overlay]="--size 1280x720")
+# sample -> the process name it runs under with a listed-process profile (one whose file
+# name contains "listed"): the library draws sprites per eye for listed games only.
+declare -A listed_process=([es1_sprites]=com.rovio.angrybirds)
+
 root="$(cd "$(dirname "$0")/.." && pwd)"
 build="${OVO_BUILD_DIR:-$root/build}"
 out="$root/out/demo"
@@ -13,7 +29,27 @@ mkdir -p "$out"
 export EGL_PLATFORM=surfaceless
 status=0
 
+profile_tool="$build/tools/ovo-profile/ovo-profile"
+frames_tool="$build/tools/ovo-frames/ovo-frames"
+panel_driver="$build/src/platform/libovo_panel_driver.so"
+# The library whose vendor EGL is the swap-capture shim, and its device root, where the
+# profile, the version report and the panel's nodes live.
+capture_library="$build/capture/GLES_ovo_capture"
+device="$build/capture-device"
+installed_profile="$device/sdcard/stereoconv/game/stereo_gm.ovo"
+mkdir -p "$device/sdcard/stereoconv/game" "$device/sdcard/duoscope" "$device/dev"
+
+# run_captured PROCESS_NAME PROGRAM IMAGE RAW LOG [OPTION...]: PROGRAM under PROCESS_NAME
+# through the capture library, the panel driver stand-in loaded; RAW gets the last swap.
+run_captured() {
+  local name="$1" program="$2" image="$3" raw="$4" log="$5"
+  shift 5
+  LD_LIBRARY_PATH="$capture_library" LD_PRELOAD="$panel_driver" OVO_SWAP_CAPTURE="$raw" \
+    bash -c 'exec -a "$0" "$@"' "$name" "$program" "$image" "$@" >/dev/null 2>"$log"
+}
+
 echo "Without a profile every call passes through unchanged:"
+rm -f "$installed_profile"
 for program in "$build"/examples/*_ovo; do
   sample="$(basename "$program" _ovo)"
   # The library's Android log lines (standard error on a host) go to a file of their own.
@@ -25,33 +61,82 @@ for program in "$build"/examples/*_ovo; do
     echo "  $sample: out/demo/$sample.png DIFFERS from out/demo/${sample}_mesa.png"
     status=1
   fi
+  # The frame at the vendor's swap is the one the sample read just before it.
+  if run_captured "$program" "$program" "$out/$sample.own.png" "$out/$sample.raw.png" \
+      "$out/$sample.raw.log" &&
+     "$frames_tool" compare "$out/$sample.raw.png" "$out/$sample.own.png" >"$out/$sample.compare" 2>&1; then
+    echo "    captured at the swap: out/demo/$sample.raw.png (identical to the sample's own frame)"
+  else
+    echo "    captured at the swap: out/demo/$sample.raw.png DIFFERS: $(cat "$out/$sample.compare")"
+    status=1
+  fi
 done
 
-# The library's device root, where the profile, the version report and the panel's nodes
-# live on a host.
-device="$(sed -n 's/^OVO_DEVICE_ROOT:[A-Z]*=//p' "$build/CMakeCache.txt")"
-profile_tool="$build/tools/ovo-profile/ovo-profile"
-echo "With an example profile (examples/profiles), as the library reads it:"
-for pair in column_interleave:es2_scene side_by_side_plain:es1_scene top_bottom_plain:es1_sprites; do
-  profile="${pair%%:*}"
-  sample="${pair##*:}"
-  program="$build/examples/${sample}_ovo"
-  mode="$("$profile_tool" show "$build/profiles/$profile.ovo" --process "$program" | sed -n 's/^mode = //p')"
-  mkdir -p "$device/sdcard/stereoconv/game" "$device/sdcard/duoscope" "$device/dev"
-  cp "$build/profiles/$profile.ovo" "$device/sdcard/stereoconv/game/stereo_gm.ovo"
-  rm -f "$device/sdcard/duoscope/version.txt"
-  : >"$device/dev/zpx"
-  image="$out/$sample.$profile.png"
-  # Enough frames for the panel refresh, which runs on processor time, to come round.
-  LD_PRELOAD="$build/src/platform/libovo_panel_driver.so" \
-    "$program" "$image" --frames 60 >/dev/null 2>"$out/$sample.$profile.log"
-  report="$(sed -n 's/^\t//p' "$device/sdcard/duoscope/version.txt" 2>/dev/null | tail -n 1)"
-  landscape="$(grep -c 'argument=1$' "$device/dev/zpx" || true)"
-  portrait="$(grep -c 'argument=2$' "$device/dev/zpx" || true)"
-  consumed="kept"
-  [ -e "$device/sdcard/stereoconv/game/stereo_gm.ovo" ] || consumed="deleted at eglGetDisplay"
-  echo "  $profile with $sample: mode $mode; profile file $consumed;" \
-    "version report: ${report:-none}; panel requests: $landscape 3D landscape, $portrait 3D portrait;" \
-    "out/demo/$sample.$profile.png"
+# Long enough by processor time for the panel refresh to come round; samples without
+# --cpu-seconds draw a fixed number of frames instead.
+run_length() {
+  local usage
+  usage="$("$1" 2>&1 || true)"
+  if [[ "$usage" == *--cpu-seconds* ]]; then echo "--cpu-seconds $cpu_seconds"; else echo "--frames 60"; fi
+}
+
+echo "With each example profile (examples/profiles), through the capture library:"
+for text in "$root"/examples/profiles/*.txt; do
+  profile="$(basename "$text" .txt)"
+  for program in "$build"/examples/*_ovo; do
+    sample="$(basename "$program" _ovo)"
+    if [ -n "${profile_sample[$profile]:-}" ] && [ "${profile_sample[$profile]}" != "$sample" ]; then
+      continue
+    fi
+    name="$program"
+    if [[ "$profile" == *listed* ]] && [ -n "${listed_process[$sample]:-}" ]; then
+      name="${listed_process[$sample]}"
+    fi
+    if ! shown="$("$profile_tool" show "$build/profiles/$profile.ovo" --process "$name")"; then
+      echo "  $profile: no binary profile in $build/profiles (configure again to pick it up)"
+      status=1
+      continue
+    fi
+    mode="$(sed -n 's/^mode = //p' <<<"$shown")"
+    valid="$(sed -n 's/^valid = //p' <<<"$shown")"
+
+    cp "$build/profiles/$profile.ovo" "$installed_profile"
+    rm -f "$device/sdcard/duoscope/version.txt"
+    : >"$device/dev/zpx"
+    : >"$device/dev/zdriver"
+    base="$sample.$profile"
+    # shellcheck disable=SC2046,SC2086  # options of several words
+    if ! run_captured "$name" "$program" "$out/$base.png" "$out/$base.raw.png" "$out/$base.log" \
+        $(run_length "$program") ${profile_options[$profile]:-}; then
+      echo "  $profile with $sample: the sample FAILED (out/demo/$base.log)"
+      status=1
+      continue
+    fi
+    files="out/demo/$base.png (the sample's own frame), out/demo/$base.raw.png (at the swap)"
+    if [[ "$mode" == shader || "$mode" == shader_listed ]] && [ "$valid" = true ]; then
+      for view in preview:sbs anaglyph:anaglyph; do
+        if "$frames_tool" "${view%%:*}" "$out/$base.raw.png" --eye0-columns "$eye0_columns" \
+            -o "$out/$base.${view##*:}.png"; then
+          files+=", out/demo/$base.${view##*:}.png"
+        else
+          status=1
+        fi
+      done
+    fi
+
+    report="$(sed -n 's/^\t//p' "$device/sdcard/duoscope/version.txt" 2>/dev/null | tail -n 1)"
+    landscape="$(grep -c 'request=0xc0047602 argument=1$' "$device/dev/zpx" || true)"
+    portrait="$(grep -c 'request=0xc0047602 argument=2$' "$device/dev/zpx" || true)"
+    composition="$(grep -c 'request=0x616 ' "$device/dev/zdriver" || true)"
+    consumed="kept"
+    [ -e "$installed_profile" ] || consumed="deleted at eglGetDisplay"
+    as=""
+    [ "$name" = "$program" ] || as=" (as $name)"
+    echo "  $profile with $sample$as: mode $mode; profile file $consumed; version report: ${report:-none}"
+    echo "    panel requests: /dev/zpx $landscape 3D landscape, $portrait 3D portrait;" \
+      "/dev/zdriver $composition composition start"
+    echo "    $files"
+  done
 done
+rm -f "$installed_profile"
 exit $status
