@@ -34,7 +34,9 @@ void QueryArray(const ArrayQueries& queries, GLint* values, const void** pointer
     *pointer = answer;
 }
 
-GLboolean Boolean(GLint value) { return value != 0 ? GL_TRUE : GL_FALSE; }
+GLboolean Boolean(GLint value) {
+    return value != 0 ? GL_TRUE : GL_FALSE;
+}
 
 }  // namespace
 

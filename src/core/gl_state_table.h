@@ -14,30 +14,32 @@ namespace ovo {
 
 // What one saved item is, how it is queried and how it is put back.
 enum GlStateKind : uint8_t {
-    GL_STATE_ENABLE,            // glIsEnabled(name); glEnable / glDisable(name)
-    GL_STATE_CLIENT_ARRAY,      // glIsEnabled(name); glEnableClientState / glDisableClientState(name)
-    GL_STATE_COLOR_MASK,        // glGetBooleanv(GL_COLOR_WRITEMASK); glColorMask
-    GL_STATE_DEPTH_MASK,        // glGetBooleanv(GL_DEPTH_WRITEMASK); glDepthMask
-    GL_STATE_VIEWPORT,          // glGetIntegerv(GL_VIEWPORT); glViewport
-    GL_STATE_SCISSOR_BOX,       // glGetIntegerv(GL_SCISSOR_BOX); glScissor
-    GL_STATE_MATRIX_MODE,       // glGetIntegerv(GL_MATRIX_MODE); glMatrixMode
-    GL_STATE_BLEND_FUNC,        // glGetIntegerv(GL_BLEND_SRC), then GL_BLEND_DST; glBlendFunc
-    GL_STATE_ALPHA_FUNC,        // glGetIntegerv(GL_ALPHA_TEST_FUNC), glGetFloatv(GL_ALPHA_TEST_REF); glAlphaFunc
-    GL_STATE_TEXTURE_BINDING,   // glGetIntegerv(GL_TEXTURE_BINDING_2D); glBindTexture(GL_TEXTURE_2D)
-    GL_STATE_TEX_ENV_MODE,      // glGetTexEnviv(GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE); glTexEnvi
-    GL_STATE_ARRAY_BUFFER,      // glGetIntegerv(GL_ARRAY_BUFFER_BINDING); glBindBuffer(GL_ARRAY_BUFFER)
-    GL_STATE_CULL_FACE_MODE,    // glGetIntegerv(GL_CULL_FACE_MODE); glCullFace
-    GL_STATE_FRONT_FACE,        // glGetIntegerv(GL_FRONT_FACE); glFrontFace
-    GL_STATE_VERTEX_POINTER,    // glGetIntegerv GL_VERTEX_ARRAY_SIZE, _TYPE, _STRIDE, then
-                                // glGetPointerv(GL_VERTEX_ARRAY_POINTER); glVertexPointer
-    GL_STATE_TEXCOORD_POINTER,  // the same for GL_TEXTURE_COORD_ARRAY_*; glTexCoordPointer
-    GL_STATE_PROGRAM,           // glGetIntegerv(GL_CURRENT_PROGRAM); glUseProgram
+    GL_STATE_ENABLE,           // glIsEnabled(name); glEnable / glDisable(name)
+    GL_STATE_CLIENT_ARRAY,     // glIsEnabled(name); glEnableClientState / glDisableClientState
+    GL_STATE_COLOR_MASK,       // glGetBooleanv(GL_COLOR_WRITEMASK); glColorMask
+    GL_STATE_DEPTH_MASK,       // glGetBooleanv(GL_DEPTH_WRITEMASK); glDepthMask
+    GL_STATE_VIEWPORT,         // glGetIntegerv(GL_VIEWPORT); glViewport
+    GL_STATE_SCISSOR_BOX,      // glGetIntegerv(GL_SCISSOR_BOX); glScissor
+    GL_STATE_MATRIX_MODE,      // glGetIntegerv(GL_MATRIX_MODE); glMatrixMode
+    GL_STATE_BLEND_FUNC,       // glGetIntegerv(GL_BLEND_SRC), then GL_BLEND_DST; glBlendFunc
+    GL_STATE_ALPHA_FUNC,       // glGetIntegerv(GL_ALPHA_TEST_FUNC),
+                               // glGetFloatv(GL_ALPHA_TEST_REF); glAlphaFunc
+    GL_STATE_TEXTURE_BINDING,  // glGetIntegerv(GL_TEXTURE_BINDING_2D); glBindTexture(GL_TEXTURE_2D)
+    GL_STATE_TEX_ENV_MODE,     // glGetTexEnviv(GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE); glTexEnvi
+    GL_STATE_ARRAY_BUFFER,     // glGetIntegerv(GL_ARRAY_BUFFER_BINDING);
+                               // glBindBuffer(GL_ARRAY_BUFFER)
+    GL_STATE_CULL_FACE_MODE,   // glGetIntegerv(GL_CULL_FACE_MODE); glCullFace
+    GL_STATE_FRONT_FACE,       // glGetIntegerv(GL_FRONT_FACE); glFrontFace
+    GL_STATE_VERTEX_POINTER,   // glGetIntegerv GL_VERTEX_ARRAY_SIZE, _TYPE, _STRIDE, then
+                               // glGetPointerv(GL_VERTEX_ARRAY_POINTER); glVertexPointer
+    GL_STATE_TEXCOORD_POINTER, // the same for GL_TEXTURE_COORD_ARRAY_*; glTexCoordPointer
+    GL_STATE_PROGRAM,          // glGetIntegerv(GL_CURRENT_PROGRAM); glUseProgram
 };
 
 struct GlStateItem {
     GlStateKind m_kind;
-    GLenum m_name;         // the capability or client state of ENABLE / CLIENT_ARRAY
-    bool m_set;            // set to m_set_value right after saving it
+    GLenum m_name;  // the capability or client state of ENABLE / CLIENT_ARRAY
+    bool m_set;     // set to m_set_value right after saving it
     // In the put-back call's argument order: {GL_FALSE x4} for a colour mask, {GL_BACK} for
     // the cull face, {1} to enable, {GL_NOTEQUAL, 0} for the alpha function (the reference
     // as a whole number), {size, type, stride} for a pointer (set to null).
@@ -68,8 +70,8 @@ private:
         GlStateKind m_kind;
         GLenum m_name;
         GLint m_values[4];
-        GLfloat m_reference;     // the alpha test reference
-        const void* m_pointer;   // an array pointer
+        GLfloat m_reference;    // the alpha test reference
+        const void* m_pointer;  // an array pointer
     };
 
     static void Apply(const SavedState& state);

@@ -17,7 +17,8 @@ struct TargetSize {
 };
 
 constexpr TargetSize COMPOSITION_KNOWN_SIZES[] = {
-    {800, 480}, {800, 1280}, {480, 800}, {960, 540}, {540, 960}, {1280, 720}, {1280, 800}, {720, 1280},
+    {800, 480}, {800, 1280}, {480, 800},  {960, 540},
+    {540, 960}, {1280, 720}, {1280, 800}, {720, 1280},
 };
 
 // Every size outside the table is drawn at this one.
@@ -45,7 +46,9 @@ CompositionRenderer::CompositionRenderer(GLint color_location, uint32_t swap_eye
       m_vertex_shader(0),
       m_fragment_shader(0) {}
 
-CompositionRenderer::~CompositionRenderer() { delete[] m_vertices; }
+CompositionRenderer::~CompositionRenderer() {
+    delete[] m_vertices;
+}
 
 void CompositionRenderer::Present(StereoManager& manager) {
     if (g_composition_first_present) {

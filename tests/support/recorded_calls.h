@@ -26,13 +26,15 @@ inline void AnswerBytes(uint32_t gl_index, uint64_t key, const void* bytes, size
     RecorderAnswer* answer = const_cast<RecorderAnswer*>(FindAnswer(state, gl_index, key));
     if (answer == nullptr) {
         if (state.m_answer_count == RECORDER_ANSWER_CAPACITY) {
-            std::fprintf(stderr, "recorded_calls: more than %u answers\n", RECORDER_ANSWER_CAPACITY);
+            std::fprintf(stderr, "recorded_calls: more than %u answers\n",
+                         RECORDER_ANSWER_CAPACITY);
             std::abort();
         }
         answer = &state.m_answers[state.m_answer_count++];
     }
     if (byte_count > RECORDER_ANSWER_BYTES) byte_count = RECORDER_ANSWER_BYTES;
-    *answer = RecorderAnswer{gl_index, key, static_cast<uint32_t>(byte_count), {}, has_result, result};
+    *answer =
+        RecorderAnswer{gl_index, key, static_cast<uint32_t>(byte_count), {}, has_result, result};
     if (byte_count > 0) std::memcpy(answer->m_bytes, bytes, byte_count);
 }
 
@@ -44,7 +46,8 @@ inline void AnswerFloats(uint32_t gl_index, uint64_t key, std::initializer_list<
     AnswerBytes(gl_index, key, values.begin(), values.size() * sizeof(GLfloat));
 }
 
-inline void AnswerBooleans(uint32_t gl_index, uint64_t key, std::initializer_list<GLboolean> values) {
+inline void AnswerBooleans(uint32_t gl_index, uint64_t key,
+                           std::initializer_list<GLboolean> values) {
     AnswerBytes(gl_index, key, values.begin(), values.size() * sizeof(GLboolean));
 }
 
@@ -52,7 +55,9 @@ inline void AnswerResult(uint32_t gl_index, uint64_t key, uint64_t value) {
     AnswerBytes(gl_index, key, nullptr, 0, true, value);
 }
 
-inline void ClearAnswers() { RecorderGetState()->m_answer_count = 0; }
+inline void ClearAnswers() {
+    RecorderGetState()->m_answer_count = 0;
+}
 
 inline std::string FormatArgument(uint64_t bits, uint8_t kind) {
     char text[32];

@@ -161,7 +161,8 @@ Result RecordCall(Arguments... arguments) {
         const RecorderAnswer* answer = GiveAnswer(INDEX, arguments...);
         static_cast<void>(answer);  // unused by functions without a result
         if constexpr (!std::is_void_v<Result> && !std::is_pointer_v<Result>) {
-            if (answer != nullptr && answer->m_has_result) return static_cast<Result>(answer->m_result);
+            if (answer != nullptr && answer->m_has_result)
+                return static_cast<Result>(answer->m_result);
         }
     }
     return RecorderResult<Result>(API, INDEX);
