@@ -1,0 +1,329 @@
+// The column mask on the recording vendor: the lines, the stencil references, the panel's
+// composition start, and the exact calls of one frame in each drawing path.
+#include "present/composition_renderer.h"
+
+#include <gtest/gtest.h>
+
+#include <algorithm>
+#include <ostream>
+#include <string>
+#include <vector>
+
+#include "core/stereo_manager.h"
+#include "support/device_files.h"
+#include "support/egl_session.h"
+#include "support/forwarding_check.h"
+#include "support/recorded_calls.h"
+#include "support/vendor_root.h"
+
+namespace {
+
+using namespace recorded_calls;
+
+enum DrawingPath : bool { PATH_GL1 = false, PATH_GL2 = true };
+
+class CompositionRendererTest : public ::testing::Test {
+protected:
+    void Start(DrawingPath path, int32_t width, int32_t height) {
+        vendor_root::InstallRecorder();
+        m_egl.Open();
+        ASSERT_NE(m_egl.m_display, EGL_NO_DISPLAY);
+        ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(path == PATH_GL2 ? 2 : 1)), EGL_TRUE);
+        device_files::Write("/dev/zdriver", "");
+        Manager().m_es2_layer_installed = path == PATH_GL2;
+        SetTargetSize(width, height);
+        ClearAnswers();
+        ResetRecorder();
+    }
+
+    static ovo::StereoManager& Manager() { return ovo::StereoManager::instance(); }
+    static void SetTargetSize(int32_t width, int32_t height) {
+        Manager().m_profile->m_target_width = width;
+        Manager().m_profile->m_target_height = height;
+    }
+
+    EglSession m_egl;
+    ovo::CompositionRenderer m_renderer{0, 1};
+};
+
+// The recorded GL calls, naming the first one that differs.
+void ExpectCalls(const std::vector<std::string>& expected) {
+    const std::vector<std::string> calls = RecordedGlCalls();
+    for (size_t i = 0; i < std::max(calls.size(), expected.size()); ++i) {
+        ASSERT_EQ(i < calls.size() ? calls[i] : "(none)",
+                  i < expected.size() ? expected[i] : "(none)")
+            << "call " << i;
+    }
+}
+
+struct Line {
+    float m_x0, m_y0, m_x1, m_y1;
+};
+
+struct LineCase {
+    const char* m_label;
+    DrawingPath m_path;
+    int32_t m_width;
+    int32_t m_height;
+    int32_t m_count;
+    Line m_first;
+    Line m_last;
+};
+
+// Unknown sizes are drawn as 800 x 480.
+constexpr Line GL2_FALLBACK_FIRST = {0.001f, 480, 0.001f, 0};
+constexpr Line GL2_FALLBACK_LAST = {800.001f, 480, 800.001f, 0};
+constexpr Line GL1_FALLBACK_FIRST = {-400, 240, -400, -240};
+constexpr Line GL1_FALLBACK_LAST = {400, 240, 400, -240};
+
+const LineCase LINE_CASES[] = {
+    {"Gl2_1280x720", PATH_GL2, 1280, 720, 641, {0, 0, 0, 720}, {1280, 0, 1280, 720}},
+    {"Gl1_1280x720", PATH_GL1, 1280, 720, 641, {-640, 360, -640, -360}, {640, 360, 640, -360}},
+    {"Gl1_480x800", PATH_GL1, 480, 800, 241, {-240, 400, -240, -400}, {240, 400, 240, -400}},
+    {"Gl2_1024x600", PATH_GL2, 1024, 600, 401, GL2_FALLBACK_FIRST, GL2_FALLBACK_LAST},
+    {"Gl1_1024x600", PATH_GL1, 1024, 600, 401, GL1_FALLBACK_FIRST, GL1_FALLBACK_LAST},
+    {"Gl2_0x0", PATH_GL2, 0, 0, 401, GL2_FALLBACK_FIRST, GL2_FALLBACK_LAST},
+    {"Gl1_0x0", PATH_GL1, 0, 0, 401, GL1_FALLBACK_FIRST, GL1_FALLBACK_LAST},
+    {"Gl2_Negative", PATH_GL2, -800, -480, 401, GL2_FALLBACK_FIRST, GL2_FALLBACK_LAST},
+    {"Gl1_Negative", PATH_GL1, -1280, 720, 401, GL1_FALLBACK_FIRST, GL1_FALLBACK_LAST},
+    {"Gl1_Huge", PATH_GL1, 0x7FFFFFFF, 0x7FFFFFFF, 401, GL1_FALLBACK_FIRST, GL1_FALLBACK_LAST},
+};
+
+void ExpectLine(const float* line, const Line& expected, const char* which) {
+    EXPECT_FLOAT_EQ(line[0], expected.m_x0) << which;
+    EXPECT_FLOAT_EQ(line[1], expected.m_y0) << which;
+    EXPECT_FLOAT_EQ(line[2], expected.m_x1) << which;
+    EXPECT_FLOAT_EQ(line[3], expected.m_y1) << which;
+}
+
+void PrintTo(const LineCase& each, std::ostream* out) {
+    *out << each.m_label;
+}
+
+class MaskLinesTest : public CompositionRendererTest,
+                      public ::testing::WithParamInterface<LineCase> {};
+
+// Each case is a process of its own: the lines are built once per process.
+TEST_P(MaskLinesTest, AreBuiltForTheTargetSizeOfTheFirstPresent) {
+    const LineCase& each = GetParam();
+    Start(each.m_path, each.m_width, each.m_height);
+    m_renderer.Present(Manager());
+    ASSERT_EQ(m_renderer.LineCount(), each.m_count);
+    const float* lines = m_renderer.Vertices();
+    ExpectLine(lines, each.m_first, "line 0");
+    ExpectLine(&lines[4 * (each.m_count - 1)], each.m_last, "last line");
+    for (int32_t i = 1; i < each.m_count; ++i) {
+        ASSERT_NEAR(lines[4 * i] - lines[4 * (i - 1)], 2.0f, 1e-3f)
+            << "line " << i << " is two columns on";
+        ASSERT_EQ(lines[4 * i], lines[4 * i + 2]) << "line " << i << " is vertical";
+    }
+    const std::string draw = "glDrawArrays(1, 0, " + std::to_string(2 * each.m_count) + ")";
+    const std::vector<std::string> calls = RecordedGlCalls();
+    EXPECT_NE(std::find(calls.begin(), calls.end(), draw), calls.end()) << draw;
+}
+
+INSTANTIATE_TEST_SUITE_P(Sizes, MaskLinesTest, ::testing::ValuesIn(LINE_CASES),
+                         [](const ::testing::TestParamInfo<LineCase>& test) {
+                             return test.param.m_label;
+                         });
+
+TEST_F(CompositionRendererTest, EyesSelectTheirStencilReferenceAndClearsKeepTheMask) {
+    Start(PATH_GL2, 800, 480);
+    struct Case {
+        uint32_t m_swap_eyes;
+        int m_eye;
+        const char* m_call;
+    } cases[] = {{1, 0, "glStencilFunc(0x0202, 1, 1)"},
+                 {1, 1, "glStencilFunc(0x0202, 0, 1)"},
+                 {7, 0, "glStencilFunc(0x0202, 1, 1)"},
+                 {0, 0, "glStencilFunc(0x0202, 0, 1)"},
+                 {0, 1, "glStencilFunc(0x0202, 1, 1)"}};
+    for (const Case& each : cases) {
+        ResetRecorder();
+        ovo::CompositionRenderer(0, each.m_swap_eyes).SelectEye(each.m_eye);
+        EXPECT_EQ(RecordedGlCalls(), std::vector<std::string>{each.m_call})
+            << "swap " << each.m_swap_eyes << " eye " << each.m_eye;
+    }
+    ResetRecorder();
+    m_renderer.SetMaskTest(1);
+    m_renderer.SetMaskTest(0);
+    m_renderer.SetMaskTest(2);
+    EXPECT_EQ(RecordedGlCalls(), (std::vector<std::string>{"glEnable(0x0B90)", "glDisable(0x0B90)",
+                                                           "glDisable(0x0B90)"}));
+    EXPECT_EQ(ovo::CompositionRenderer::FilterClearMask(0x4500), 0x4100u);
+    EXPECT_EQ(ovo::CompositionRenderer::FilterClearMask(0x4000), 0x4000u);
+    EXPECT_EQ(ovo::CompositionRenderer::FilterClearMask(0x0400), 0x0000u);
+}
+
+TEST_F(CompositionRendererTest,
+       TheCompositionStartsOnceAndLaterSizesMoveOnlyViewportAndProjection) {
+    Start(PATH_GL2, 800, 480);
+    m_renderer.Present(Manager());
+    SetTargetSize(1280, 720);
+    ResetRecorder();
+    m_renderer.Present(Manager());
+    m_renderer.Present(Manager());
+    EXPECT_EQ(device_files::Read("/dev/zdriver"), "request=0x616 argument=1\n");
+    EXPECT_EQ(m_renderer.LineCount(), 401);
+    const std::vector<std::string> calls = RecordedGlCalls();
+    EXPECT_EQ(std::count(calls.begin(), calls.end(), "glViewport(0, 0, 1280, 720)"), 2);
+    EXPECT_EQ(std::count(calls.begin(), calls.end(), "glDrawArrays(1, 0, 802)"), 2);
+    // The projection is read where the vendor received it.
+    const RecordedCall* uniform =
+        FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glUniformMatrix4fv);
+    ASSERT_NE(uniform, nullptr);
+    const float* projection = reinterpret_cast<const float*>(uniform->m_arguments[3]);
+    EXPECT_FLOAT_EQ(projection[0], 2.0f / 1280);
+    EXPECT_FLOAT_EQ(projection[5], 2.0f / 720);
+    const RecordedCall* pointer =
+        FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glVertexAttribPointer);
+    ASSERT_NE(pointer, nullptr);
+    EXPECT_EQ(pointer->m_arguments[5], ArgumentBits(m_renderer.Vertices()));
+}
+
+TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
+    Start(PATH_GL1, 1280, 720);
+    m_renderer.Present(Manager());  // builds the lines
+    // Saved values that differ from everything the frame sets.
+    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_COLOR_WRITEMASK, {0, 1, 0, 1});
+    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_DEPTH_WRITEMASK, {1});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_MATRIX_MODE, {GL_TEXTURE});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_BLEND_SRC, {GL_SRC_ALPHA});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_BLEND_DST, {GL_ONE_MINUS_SRC_ALPHA});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VIEWPORT, {1, 2, 3, 4});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_SCISSOR_BOX, {5, 6, 7, 8});
+    for (GLenum on : {GL_BLEND, GL_TEXTURE_2D, GL_ALPHA_TEST, GL_TEXTURE_COORD_ARRAY,
+                      GL_COLOR_ARRAY, GL_CULL_FACE})
+        AnswerResult(ovo::GL_ENTRY_glIsEnabled, on, GL_TRUE);
+    for (GLenum off : {GL_DEPTH_TEST, GL_LIGHTING, GL_SCISSOR_TEST, GL_VERTEX_ARRAY})
+        AnswerResult(ovo::GL_ENTRY_glIsEnabled, off, GL_FALSE);
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_ALPHA_TEST_FUNC, {GL_GREATER});
+    AnswerFloats(ovo::GL_ENTRY_glGetFloatv, GL_ALPHA_TEST_REF, {0.5f});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {21});
+    AnswerIntegers(ovo::GL_ENTRY_glGetTexEnviv, GL_TEXTURE_ENV_MODE, {GL_MODULATE});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_ARRAY_BUFFER_BINDING, {10});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CULL_FACE_MODE, {GL_FRONT});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRONT_FACE, {GL_CW});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VERTEX_ARRAY_SIZE, {3});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VERTEX_ARRAY_TYPE, {GL_SHORT});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VERTEX_ARRAY_STRIDE, {12});
+    const void* application_vertices = &application_vertices;
+    AnswerBytes(ovo::GL_ENTRY_glGetPointerv, GL_VERTEX_ARRAY_POINTER, &application_vertices,
+                sizeof(void*));
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_COORD_ARRAY_SIZE, {2});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_COORD_ARRAY_TYPE, {GL_FLOAT});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_COORD_ARRAY_STRIDE, {8});
+    SetTargetSize(960, 540);  // the lines stay; viewport and projection follow
+    ResetRecorder();
+    m_renderer.Present(Manager());
+    const std::vector<std::string> expected = {
+        "glEnable(0x0B90)", "glClearStencil(1)", "glClear(0x4500)", "glStencilFunc(0x0200, 0, 1)",
+        "glStencilOp(0x1E01, 0x1E00, 0x1E00)",
+        // saved, the write masks switched off right away
+        "glGetBooleanv(0x0C23, ptr)", "glColorMask(0, 0, 0, 0)", "glGetBooleanv(0x0B72, ptr)",
+        "glDepthMask(0)", "glGetIntegerv(0x0BA0, ptr)", "glGetIntegerv(0x0BE1, ptr)",
+        "glGetIntegerv(0x0BE0, ptr)", "glGetIntegerv(0x0BA2, ptr)", "glGetIntegerv(0x0C10, ptr)",
+        "glIsEnabled(0x0BE2)", "glIsEnabled(0x0B71)", "glIsEnabled(0x0DE1)", "glIsEnabled(0x0B50)",
+        "glIsEnabled(0x0BC0)", "glIsEnabled(0x0C11)", "glGetIntegerv(0x0BC1, ptr)",
+        "glGetFloatv(0x0BC2, ptr)", "glGetIntegerv(0x8069, ptr)",
+        "glGetTexEnviv(0x2300, 0x2200, ptr)", "glGetIntegerv(0x8894, ptr)", "glIsEnabled(0x8078)",
+        "glIsEnabled(0x8074)", "glIsEnabled(0x8076)", "glIsEnabled(0x0B44)",
+        "glGetIntegerv(0x0B45, ptr)", "glGetIntegerv(0x0B46, ptr)", "glGetIntegerv(0x807A, ptr)",
+        "glGetIntegerv(0x807B, ptr)", "glGetIntegerv(0x807C, ptr)", "glGetPointerv(0x808E, ptr)",
+        "glGetIntegerv(0x8088, ptr)", "glGetIntegerv(0x8089, ptr)", "glGetIntegerv(0x808A, ptr)",
+        "glGetPointerv(0x8092, ptr)",
+        // set
+        "glCullFace(0x0405)", "glFrontFace(0x0901)", "glBindBuffer(0x8892, 0)",
+        "glBindTexture(0x0DE1, 0)", "glMatrixMode(0x1701)", "glPushMatrix()", "glLoadIdentity()",
+        "glOrthof(-480, 480, -270, 270, -1, 1)", "glViewport(0, 0, 960, 540)",
+        "glScissor(0, 0, 960, 540)", "glMatrixMode(0x1700)", "glPushMatrix()", "glLoadIdentity()",
+        "glEnableClientState(0x8074)", "glDisableClientState(0x8078)",
+        "glDisableClientState(0x8076)", "glDisableClientState(0x8075)",
+        "glDisableClientState(0x8B9C)", "glDisable(0x0DE1)", "glDisable(0x0BC0)",
+        "glDisable(0x0C11)", "glDisable(0x0B50)", "glDisable(0x0B44)", "glDisable(0x0B71)",
+        "glColor4f(1, 1, 1, 1)",
+        // drawn: the 641 lines built for 1280 x 720
+        "glVertexPointer(2, 0x1406, 0, ptr)", "glDrawArrays(1, 0, 1282)",
+        // restored
+        "glMatrixMode(0x1701)", "glPopMatrix()", "glMatrixMode(0x1700)", "glPopMatrix()",
+        "glEnable(0x0BC0)", "glAlphaFunc(0x0204, 0.5)", "glDisable(0x0C11)", "glEnable(0x0BE2)",
+        "glDisable(0x0B71)", "glEnable(0x0DE1)", "glDisable(0x0B50)", "glMatrixMode(0x1702)",
+        "glViewport(1, 2, 3, 4)", "glScissor(5, 6, 7, 8)", "glBlendFunc(0x0302, 0x0303)",
+        "glBindTexture(0x0DE1, 21)", "glTexEnvi(0x2300, 0x2200, 8448)", "glBindBuffer(0x8892, 10)",
+        "glEnableClientState(0x8078)", "glDisableClientState(0x8074)",
+        "glEnableClientState(0x8076)", "glEnable(0x0B44)", "glCullFace(0x0404)",
+        "glFrontFace(0x0900)", "glVertexPointer(3, 0x1402, 12, ptr)",
+        "glTexCoordPointer(2, 0x1406, 8, null)", "glDepthMask(1)", "glColorMask(0, 1, 0, 1)",
+        // the stencil stage back to keeping
+        "glStencilOp(0x1E00, 0x1E00, 0x1E00)", "glDisable(0x0B90)"};
+    ExpectCalls(expected);
+    const RecordedCall* pointer =
+        FindRecordedCall(RECORDER_API_GLES1, ovo::GL_ENTRY_glVertexPointer);
+    ASSERT_NE(pointer, nullptr);
+    EXPECT_EQ(pointer->m_arguments[3], ArgumentBits(application_vertices))
+        << "the saved pointer is put back";
+}
+
+TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
+    Start(PATH_GL2, 1024, 600);  // unknown: drawn as 800 x 480
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CURRENT_PROGRAM, {9});
+    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_COLOR_WRITEMASK, {1, 0, 1, 0});
+    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_DEPTH_WRITEMASK, {1});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VIEWPORT, {1, 2, 3, 4});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_SCISSOR_BOX, {5, 6, 7, 8});
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_BLEND, GL_TRUE);
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, GL_FALSE);
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_CULL_FACE, GL_TRUE);
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_ARRAY_BUFFER_BINDING, {10});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CULL_FACE_MODE, {GL_FRONT});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRONT_FACE, {GL_CW});
+    AnswerResult(ovo::GL_ENTRY_glCreateProgram, 0, 7);
+    AnswerResult(ovo::GL_ENTRY_glCreateShader, GL_VERTEX_SHADER, 11);
+    AnswerResult(ovo::GL_ENTRY_glCreateShader, GL_FRAGMENT_SHADER, 12);
+    AnswerResult(ovo::GL_ENTRY_glGetUniformLocation, 7, 3);
+    m_renderer.Present(Manager());
+    const std::vector<std::string> expected = {
+        "glEnable(0x0B90)", "glClearStencil(1)", "glClear(0x4500)", "glStencilFunc(0x0200, 0, 1)",
+        "glStencilOp(0x1E01, 0x1E00, 0x1E00)",
+        // saved
+        "glGetIntegerv(0x8B8D, ptr)", "glGetBooleanv(0x0C23, ptr)", "glGetBooleanv(0x0B72, ptr)",
+        "glGetIntegerv(0x0BA2, ptr)", "glGetIntegerv(0x0C10, ptr)", "glIsEnabled(0x0BE2)",
+        "glIsEnabled(0x0B71)", "glGetIntegerv(0x8894, ptr)", "glIsEnabled(0x0B44)",
+        "glGetIntegerv(0x0B45, ptr)", "glGetIntegerv(0x0B46, ptr)",
+        // set
+        "glColorMask(0, 0, 0, 0)", "glDepthMask(0)", "glCullFace(0x0405)", "glFrontFace(0x0901)",
+        "glBindBuffer(0x8892, 0)", "glViewport(0, 0, 800, 480)", "glScissor(0, 0, 800, 480)",
+        "glDisable(0x0B44)", "glDisable(0x0B71)",
+        // this frame's program
+        "glCreateProgram()", "glCreateShader(0x8B31)", "glShaderSource(11, 1, ptr, null)",
+        "glCompileShader(11)", "glCreateShader(0x8B30)", "glShaderSource(12, 1, ptr, null)",
+        "glCompileShader(12)", "glAttachShader(7, 11)", "glAttachShader(7, 12)",
+        "glBindAttribLocation(7, 0, ptr)", "glLinkProgram(7)", "glGetProgramiv(7, 0x8B82, ptr)",
+        // drawn
+        "glUseProgram(7)", "glGetUniformLocation(7, ptr)", "glUniformMatrix4fv(3, 1, 0, ptr)",
+        "glGetUniformLocation(7, ptr)", "glUniform4f(3, 1, 1, 1, 1)",
+        "glEnableVertexAttribArray(0)", "glVertexAttribPointer(0, 2, 0x1406, 0, 0, ptr)",
+        "glDrawArrays(1, 0, 802)", "glDeleteShader(11)", "glDeleteShader(12)", "glDeleteProgram(7)",
+        // restored
+        "glEnable(0x0BE2)", "glDisable(0x0B71)", "glViewport(1, 2, 3, 4)", "glScissor(5, 6, 7, 8)",
+        "glBindBuffer(0x8892, 10)", "glEnable(0x0B44)", "glCullFace(0x0404)", "glFrontFace(0x0900)",
+        "glDepthMask(1)", "glColorMask(1, 0, 1, 0)", "glUseProgram(9)",
+        "glStencilOp(0x1E00, 0x1E00, 0x1E00)", "glDisable(0x0B90)"};
+    ExpectCalls(expected);
+    // The sources, byte for byte, as the vendor received them.
+    const char* const sources[] = {
+        "attribute vec4 myVertex;uniform mat4 myPMVMatrix;void main(void){\tgl_Position = "
+        "myPMVMatrix * myVertex;}",
+        "uniform mediump vec4 color;void main (void){\tgl_FragColor = color;}"};
+    const RecorderState& state = *RecorderGetState();
+    int source = 0;
+    for (uint32_t i = 0; i < state.m_call_count; ++i) {
+        const RecordedCall& call = state.m_calls[i];
+        if (call.m_index != ovo::GL_ENTRY_glShaderSource) continue;
+        ASSERT_LT(source, 2);
+        EXPECT_STREQ(*reinterpret_cast<const char* const*>(call.m_arguments[2]), sources[source++]);
+    }
+    EXPECT_EQ(source, 2);
+}
+
+}  // namespace
