@@ -7,8 +7,9 @@
 # and as a red-cyan anaglyph. The images go to out/demo/.
 set -euo pipefail
 
-# The columns eye 0 lands on: how Mesa (llvmpipe) rasterises the lines of the stencil mask.
-eye0_columns=odd
+# The columns eye 0 lands on: how Mesa (llvmpipe) rasterises the lines of the stencil mask,
+# measured there (the frame at the swap is the samples' own eye renderings interleaved so).
+eye0_columns=even
 # Processor time per run with a profile: the panel refresh comes round every 0.1 s of it.
 cpu_seconds=0.5
 # profile -> the one sample it is made for; a profile not named here goes with every sample.
