@@ -87,17 +87,15 @@ XmlToken XmlTokenizer::SkipComment() {
     return XML_TOKEN_COMMENT;
 }
 
-// A string that the end of file cuts off is an error: its text is not what the file's
-// writer meant. A string or name too long for the buffer is read to its end before the
-// error is reported, so that reading resumes after it rather than inside it.
+// The end of file ends a string as it ends the element around it, so a configuration
+// cut off inside its last value keeps everything read. A string or name too long for the
+// buffer is read to its end before the error is reported, so that reading resumes after
+// it rather than inside it.
 XmlToken XmlTokenizer::ReadString() {
     size_t length = 0;
     bool fits = true;
     m_text[0] = '\0';
-    for (int c = Get(); c != '"'; c = Get()) {
-        if (c == EOF) return XML_TOKEN_ERROR;
-        fits = Append(&length, c) && fits;
-    }
+    for (int c = Get(); c != '"' && c != EOF; c = Get()) fits = Append(&length, c) && fits;
     return fits ? XML_TOKEN_STRING : XML_TOKEN_ERROR;
 }
 

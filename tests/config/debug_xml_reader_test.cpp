@@ -54,13 +54,16 @@ TEST(XmlReader, BuildsTheTreeThatTheFileDescribes) {
         {"<a><b></c></a><d/>", "{d}"},
         {"<a x=\"1\"><b>text", "{a[x=1]{b(text)}}"},
         {"<\xC0 \xF6=\"v\"/><\xD7/><\xF7/><9/><z/>", "{\xC0[\xF6=v]}{z}"},
-        {"<a x=\"1", ""},
+        // End of file ends an open string too; the text read so far is its value.
+        {"<a v=\"1\"><b f=\"/x.log", "{a[v=1]{b[f=/x.log]}}"},
+        {"<a x=\"", "{a[x=]}"},
         {"<a/> / <b/>", NO_DOCUMENT},
         {"<!DOCTYPE a><a/>", NO_DOCUMENT},
         {"<? / ?><a/>", "{a}"},  // errors inside a declaration are ignored
         // The token buffer holds 1023 characters; long text is cut, not fatal.
         {"<" + fits + " x=\"" + fits + "\"/>", "{" + fits + "[x=" + fits + "]}"},
         {"<" + too_long + "/><a x=\"" + too_long + "\"/><b/>", "{b}"},
+        {"<a/><b x=\"" + too_long, "{a}"},
         {"<a>  " + std::string(3000, 't') + "  <b/></a>", "{a(" + std::string(1023, 't') + "){b}}"},
     };
     for (const auto& c : cases) EXPECT_EQ(Describe(Parse(c.input).get()), c.tree);
