@@ -9,6 +9,7 @@ namespace ovo_sample {
 constexpr uint32_t REFERENCE_OPTION_EYE = 1;             // --eye, --eye-distance/-angle/-shift
 constexpr uint32_t REFERENCE_OPTION_OVERLAY = 2;         // --overlay-reference
 constexpr uint32_t REFERENCE_OPTION_VIEWPORT_SCALE = 4;  // --viewport-scale
+constexpr uint32_t REFERENCE_OPTION_TEXTURE_PASS = 8;    // --texture-pass
 
 constexpr int32_t REFERENCE_NO_EYE = -1;
 
@@ -20,6 +21,10 @@ struct ReferenceOptions {
     float m_eye_distance = 0.0f;
     float m_eye_angle = 0.0f;
     float m_eye_shift = 0.0f;
+
+    // Draws into the game's own framebuffers are made once per eye, each with that eye's
+    // transform, instead of once with whatever transform the last window draw left.
+    bool m_texture_pass_per_eye = false;
 
     // The HUD is collected in a texture and drawn into both halves of an overlay area of
     // m_overlay_width x m_overlay_height per eye, instead of being shifted per eye.

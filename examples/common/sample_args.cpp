@@ -113,6 +113,13 @@ bool ParseEyeShift(const char* text, SampleArgs* args) {
     return ParseWholeFloat(text, &args->m_reference.m_eye_shift);
 }
 
+bool ParseTexturePass(const char* text, SampleArgs* args) {
+    const bool per_eye = std::strcmp(text, "per-eye") == 0;
+    if (!per_eye && std::strcmp(text, "once") != 0) return false;
+    args->m_reference.m_texture_pass_per_eye = per_eye;
+    return true;
+}
+
 bool ParseOverlay(const char* text, SampleArgs* args) {
     ReferenceOptions& reference = args->m_reference;
     reference.m_overlay =
@@ -155,10 +162,12 @@ const SampleOption SAMPLE_OPTIONS[] = {
      REFERENCE_OPTION_EYE, EyeRule::NEEDS_EYE},
     {"--eye-shift", "S", "shift of flat draws (default 0)", ParseEyeShift, REFERENCE_OPTION_EYE,
      EyeRule::NEEDS_EYE},
+    {"--texture-pass", "once|per-eye", "draws into the game's framebuffers: once (default) "
+     "or per eye", ParseTexturePass, REFERENCE_OPTION_TEXTURE_PASS, EyeRule::NEEDS_EYE},
     {"--overlay-reference", "W,H", "HUD through a texture, composed into two W x H halves",
      ParseOverlay, REFERENCE_OPTION_OVERLAY, EyeRule::NEEDS_EYE},
-    {"--viewport-scale", "SX,SY", "scale every viewport the game sets", ParseViewportScale,
-     REFERENCE_OPTION_VIEWPORT_SCALE, EyeRule::WITHOUT_EYE},
+    {"--viewport-scale", "SX,SY", "scale the viewports the game sets for its window",
+     ParseViewportScale, REFERENCE_OPTION_VIEWPORT_SCALE, EyeRule::WITHOUT_EYE},
 };
 
 const SampleOption* FindOption(const SampleInfo& info, const char* name) {

@@ -106,7 +106,7 @@ void DrawCubeElements(GLuint indices) {
 bool Es2Scene::Init(const char* program, int32_t width, int32_t height) {
     m_width = width;
     m_height = height;
-    if (!CreateScenePrograms(program, &m_programs)) return false;
+    if (!CreateScenePrograms(program, m_eye_shift, &m_programs)) return false;
     CreateSceneMeshes(&m_meshes);
     if (!m_monitor.Create(program, MONITOR_SIZE)) return false;
 
@@ -133,9 +133,25 @@ void Es2Scene::Release() {
 void Es2Scene::DrawFrame(int32_t frame) {
     DrawMonitorPicture(frame);
     glBindFramebuffer(GL_FRAMEBUFFER, 0);
-    glViewport(0, 0, m_width, m_height);
+    SetWindowViewport();
     DrawWorld(frame);
     DrawHud();
+}
+
+// A scaled viewport truncates every value toward zero, in float arithmetic; the monitor's
+// framebuffer keeps its own.
+void Es2Scene::SetWindowViewport() const {
+    if (!m_reference.m_viewport_scaled) {
+        glViewport(0, 0, m_width, m_height);
+        return;
+    }
+    glViewport(0, 0, static_cast<GLsizei>(m_width * m_reference.m_scale_x),
+               static_cast<GLsizei>(m_height * m_reference.m_scale_y));
+}
+
+void Es2Scene::UseProgram(GLuint program) {
+    glUseProgram(program);
+    m_eye_shift.SetForCurrentProgram();
 }
 
 void Es2Scene::DrawMonitorPicture(int32_t frame) {
@@ -225,7 +241,7 @@ void Es2Scene::DrawHud() {
 void Es2Scene::DrawLitCube(const Mat4& view_projection, const Mat4& model,
                            const float color[4]) {
     const LitProgram& lit = m_programs.m_lit;
-    glUseProgram(lit.m_program);
+    UseProgram(lit.m_program);
     const Mat4 mvp = Mat4Multiply(view_projection, model);
     float normal_matrix[9];
     Mat4NormalMatrix(model, normal_matrix);
@@ -239,7 +255,7 @@ void Es2Scene::DrawLitCube(const Mat4& view_projection, const Mat4& model,
 
 void Es2Scene::DrawTexturedCube(const Mat4& mvp, GLuint texture) {
     const TexturedProgram& textured = m_programs.m_textured;
-    glUseProgram(textured.m_program);
+    UseProgram(textured.m_program);
     glActiveTexture(GL_TEXTURE0);
     glBindTexture(GL_TEXTURE_2D, texture);
     glUniformMatrix4fv(textured.m_mvp, 1, GL_FALSE, mvp.m);
@@ -252,7 +268,7 @@ void Es2Scene::DrawTexturedCube(const Mat4& mvp, GLuint texture) {
 
 void Es2Scene::DrawGround(const Mat4& view_projection) {
     const TexturedProgram& textured = m_programs.m_textured;
-    glUseProgram(textured.m_program);
+    UseProgram(textured.m_program);
     glActiveTexture(GL_TEXTURE0);
     glBindTexture(GL_TEXTURE_2D, m_floor_texture);
     // The quad faces +Z; tipped back it faces up.
@@ -269,7 +285,7 @@ void Es2Scene::DrawGround(const Mat4& view_projection) {
 
 void Es2Scene::DrawPyramid(const Mat4& view_projection, const Mat4& model) {
     const FlatProgram& flat = m_programs.m_flat;
-    glUseProgram(flat.m_program);
+    UseProgram(flat.m_program);
     const Mat4 mvp = Mat4Multiply(view_projection, model);
     glUniformMatrix4fv(flat.m_mvp, 1, GL_FALSE, mvp.m);
     glBindBuffer(GL_ARRAY_BUFFER, m_meshes.m_pyramid_vertices);
@@ -291,7 +307,7 @@ void Es2Scene::DrawPyramid(const Mat4& view_projection, const Mat4& model) {
 
 void Es2Scene::DrawFlatQuad(const Mat4& mvp, const float color[4]) {
     const FlatProgram& flat = m_programs.m_flat;
-    glUseProgram(flat.m_program);
+    UseProgram(flat.m_program);
     glUniformMatrix4fv(flat.m_mvp, 1, GL_FALSE, mvp.m);
     glUniform4fv(flat.m_color, 1, color);
     UseMeshVertices(m_meshes.m_quad_vertices, flat.m_position, -1, -1);

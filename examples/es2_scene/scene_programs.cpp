@@ -1,5 +1,7 @@
 #include "es2_scene/scene_programs.h"
 
+#include <string>
+
 #include "es2_scene/shader_program.h"
 
 namespace ovo_sample {
@@ -74,8 +76,9 @@ void main() {
 }
 )";
 
-bool CreateLit(const char* program, LitProgram* lit) {
-    lit->m_program = BuildProgram(program, "lit", LIT_VERTEX_SHADER, LIT_FRAGMENT_SHADER);
+bool CreateLit(const char* program, const EyeShift& eye_shift, LitProgram* lit) {
+    const std::string vertex = eye_shift.VertexShader(LIT_VERTEX_SHADER);
+    lit->m_program = BuildProgram(program, "lit", vertex.c_str(), LIT_FRAGMENT_SHADER);
     if (lit->m_program == 0) return false;
     lit->m_position = glGetAttribLocation(lit->m_program, "a_position");
     lit->m_normal = glGetAttribLocation(lit->m_program, "a_normal");
@@ -86,9 +89,10 @@ bool CreateLit(const char* program, LitProgram* lit) {
     return true;
 }
 
-bool CreateTextured(const char* program, TexturedProgram* textured) {
+bool CreateTextured(const char* program, const EyeShift& eye_shift, TexturedProgram* textured) {
+    const std::string vertex = eye_shift.VertexShader(TEXTURED_VERTEX_SHADER);
     textured->m_program =
-        BuildProgram(program, "textured", TEXTURED_VERTEX_SHADER, TEXTURED_FRAGMENT_SHADER);
+        BuildProgram(program, "textured", vertex.c_str(), TEXTURED_FRAGMENT_SHADER);
     if (textured->m_program == 0) return false;
     textured->m_position = glGetAttribLocation(textured->m_program, "a_position");
     textured->m_uv = glGetAttribLocation(textured->m_program, "a_uv");
@@ -99,8 +103,9 @@ bool CreateTextured(const char* program, TexturedProgram* textured) {
     return true;
 }
 
-bool CreateFlat(const char* program, FlatProgram* flat) {
-    flat->m_program = BuildProgram(program, "flat", FLAT_VERTEX_SHADER, FLAT_FRAGMENT_SHADER);
+bool CreateFlat(const char* program, const EyeShift& eye_shift, FlatProgram* flat) {
+    const std::string vertex = eye_shift.VertexShader(FLAT_VERTEX_SHADER);
+    flat->m_program = BuildProgram(program, "flat", vertex.c_str(), FLAT_FRAGMENT_SHADER);
     if (flat->m_program == 0) return false;
     flat->m_position = glGetAttribLocation(flat->m_program, "a_position");
     flat->m_mvp = glGetUniformLocation(flat->m_program, "u_mvp");
@@ -115,10 +120,11 @@ void DeleteProgram(GLuint* program) {
 
 }  // namespace
 
-bool CreateScenePrograms(const char* program, ScenePrograms* programs) {
-    return CreateLit(program, &programs->m_lit) &&
-           CreateTextured(program, &programs->m_textured) &&
-           CreateFlat(program, &programs->m_flat);
+bool CreateScenePrograms(const char* program, const EyeShift& eye_shift,
+                         ScenePrograms* programs) {
+    return CreateLit(program, eye_shift, &programs->m_lit) &&
+           CreateTextured(program, eye_shift, &programs->m_textured) &&
+           CreateFlat(program, eye_shift, &programs->m_flat);
 }
 
 void DeleteScenePrograms(ScenePrograms* programs) {

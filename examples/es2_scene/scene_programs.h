@@ -3,6 +3,8 @@
 
 #include <GLES2/gl2.h>
 
+#include "es2_scene/eye_shift.h"
+
 namespace ovo_sample {
 
 // Per-vertex diffuse lighting of one colour.
@@ -41,8 +43,9 @@ struct ScenePrograms {
     FlatProgram m_flat;
 };
 
-// False after printing which program failed.
-bool CreateScenePrograms(const char* program, ScenePrograms* programs);
+// The vertex shaders go through `eye_shift`. False after printing which program failed.
+bool CreateScenePrograms(const char* program, const EyeShift& eye_shift,
+                         ScenePrograms* programs);
 void DeleteScenePrograms(ScenePrograms* programs);
 
 }  // namespace ovo_sample
