@@ -11,15 +11,17 @@ set -euo pipefail
 # measured there (the frame at the swap is the samples' own eye renderings interleaved so).
 eye0_columns=even
 # Processor time per run with a profile: the panel refresh comes round every 0.1 s of it.
-cpu_seconds=0.5
+cpu_seconds=1.0
 # profile -> the one sample it is made for; a profile not named here goes with every sample.
 declare -A profile_sample=([es1_scene_interleave]=es1_scene [es1_scene_overlay]=es1_scene
-  [es1_sprites_listed]=es1_sprites)
+  [es1_sprites_listed]=es1_sprites [es2_scene_interleave]=es2_scene
+  [es2_scene_tracked]=es2_scene)
 # profile -> the options its sample needs with it.
 declare -A profile_options=([es1_scene_overlay]="--size 1280x720")
-# sample -> the process name it runs under with a listed-process profile (one whose file
-# name contains "listed"): the library draws sprites per eye for listed games only.
-declare -A listed_process=([es1_sprites]=com.rovio.angrybirds)
+# profile -> the process name its sample runs under (else the program's path): the library
+# draws sprites per eye for listed games only, and tracks render textures for one game.
+declare -A profile_process=([es1_sprites_listed]=com.rovio.angrybirds
+  [es2_scene_tracked]=com.vectorunit.green)
 
 root="$(cd "$(dirname "$0")/.." && pwd)"
 build="${OVO_BUILD_DIR:-$root/build}"
@@ -89,10 +91,7 @@ for text in "$root"/examples/profiles/*.txt; do
     if [ -n "${profile_sample[$profile]:-}" ] && [ "${profile_sample[$profile]}" != "$sample" ]; then
       continue
     fi
-    name="$program"
-    if [[ "$profile" == *listed* ]] && [ -n "${listed_process[$sample]:-}" ]; then
-      name="${listed_process[$sample]}"
-    fi
+    name="${profile_process[$profile]:-$program}"
     if ! shown="$("$profile_tool" show "$build/profiles/$profile.ovo" --process "$name")"; then
       echo "  $profile: no binary profile in $build/profiles (configure again to pick it up)"
       status=1
