@@ -26,7 +26,7 @@ void RefreshPanel(StereoManager& manager) {
         panelRefreshStart = clock();
         panelRefreshRearm = false;
     }
-    int32_t ticks = static_cast<int32_t>(clock() - panelRefreshStart);
+    int32_t ticks = ProcessorTicksBetween(panelRefreshStart, clock());
     float elapsed = static_cast<float>(ticks) / PROCESSOR_TICKS_PER_SECOND;
     if (!(static_cast<double>(elapsed) > PANEL_REFRESH_INTERVAL_SECONDS)) return;
     panelRefreshRearm = true;
