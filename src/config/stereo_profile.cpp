@@ -1,5 +1,8 @@
 #include "config/stereo_profile.h"
 
+#include <fcntl.h>
+#include <unistd.h>
+
 #include <cstdio>
 #include <cstring>
 
@@ -67,12 +70,18 @@ int StereoProfile::DetectLiveWallpaper() {
 
 bool StereoProfile::ReadProcessName(char* name) {
     name[0] = '\0';
-    FILE* file = std::fopen(SELF_COMMAND_LINE, "r");
-    if (file == nullptr) return false;
+    // Plain system calls: the stereo draws ask for the name per eye, and must not allocate.
+    const int file = open(SELF_COMMAND_LINE, O_RDONLY | O_CLOEXEC);
+    if (file < 0) return false;
     // The last byte is kept for the terminator, so a long name is cut inside the buffer.
-    size_t length = std::fread(name, 1, PROFILE_PROCESS_NAME_CAPACITY - 1, file);
+    size_t length = 0;
+    while (length < PROFILE_PROCESS_NAME_CAPACITY - 1) {
+        const ssize_t got = read(file, name + length, PROFILE_PROCESS_NAME_CAPACITY - 1 - length);
+        if (got <= 0) break;
+        length += static_cast<size_t>(got);
+    }
     name[length] = '\0';
-    std::fclose(file);
+    close(file);
     return true;
 }
 
