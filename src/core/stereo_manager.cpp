@@ -14,6 +14,9 @@
 #include "stereo/es1_scaled_layer.h"
 #include "stereo/es1_sprite_stereo_layer.h"
 #include "stereo/es1_stereo_layer.h"
+#include "stereo/es2_scaled_layer.h"
+#include "stereo/es2_stereo_layer.h"
+#include "stereo/eye_texture.h"
 #include "stereo/gl_object_tracker.h"
 #include "stereo/overlay_target.h"
 
@@ -82,6 +85,8 @@ StereoManager::~StereoManager() {
     delete m_debug;
     delete m_overlay;
     delete m_profile;
+    // Its GL objects went with their context; only the record is freed.
+    delete m_eye_textures;
     // Released last: nothing that goes before draws any more.
     delete m_composer;
     m_objects = nullptr;
@@ -90,6 +95,7 @@ StereoManager::~StereoManager() {
     m_debug = nullptr;
     m_overlay = nullptr;
     m_profile = nullptr;
+    m_eye_textures = nullptr;
     m_composer = nullptr;
     m_interleave = false;
     m_es2_layer_installed = false;
@@ -108,9 +114,11 @@ void StereoManager::InstallEs2Layer() {
     if (m_es2_layer_installed) return;
     m_es2_layer_installed = true;
     delete m_layer;
-    // The OpenGL ES 2.0 stereo layers come with the shader rewriter; until then such a
-    // process draws flat.
-    m_layer = new PassThroughLayer();
+    if (m_profile->ResolveMode() == STEREO_MODE_PLAIN) {
+        m_layer = new Es2ScaledLayer();
+    } else {
+        m_layer = new Es2StereoLayer(Es2StereoLayer::SubmodeFor(m_process_name));
+    }
 }
 
 void StereoManager::UpdateScale() {

@@ -16,16 +16,6 @@ void Es1ScaledLayer::glClear(StereoManager& manager, GLbitfield mask) {
     raw::glClear(mask);
 }
 
-void Es1ScaledLayer::glDrawArrays(StereoManager& manager, GLenum mode, GLint first,
-                                  GLsizei count) {
-    Draw(manager, DrawCall::Arrays(mode, first, count));
-}
-
-void Es1ScaledLayer::glDrawElements(StereoManager& manager, GLenum mode, GLsizei count,
-                                    GLenum type, const void* indices) {
-    Draw(manager, DrawCall::Elements(mode, count, type, indices));
-}
-
 void Es1ScaledLayer::Draw(StereoManager& manager, const DrawCall& draw) {
     const FixedFunctionSnapshot snapshot(false);
     const bool eye_target = manager.m_profile->m_eye_target;

@@ -15,16 +15,6 @@ void Es1SpriteStereoLayer::glClear(StereoManager& manager, GLbitfield mask) {
     ClearBothEyes(manager, mask);
 }
 
-void Es1SpriteStereoLayer::glDrawArrays(StereoManager& manager, GLenum mode, GLint first,
-                                        GLsizei count) {
-    Draw(manager, DrawCall::Arrays(mode, first, count));
-}
-
-void Es1SpriteStereoLayer::glDrawElements(StereoManager& manager, GLenum mode, GLsizei count,
-                                          GLenum type, const void* indices) {
-    Draw(manager, DrawCall::Elements(mode, count, type, indices));
-}
-
 void Es1SpriteStereoLayer::Draw(StereoManager& manager, const DrawCall& draw) {
     const FixedFunctionSnapshot snapshot(true);
     raw::glMatrixMode(GL_PROJECTION);

@@ -53,16 +53,6 @@ void Es1StereoLayer::glClear(StereoManager& manager, GLbitfield mask) {
     ClearBothEyes(manager, mask);
 }
 
-void Es1StereoLayer::glDrawArrays(StereoManager& manager, GLenum mode, GLint first,
-                                  GLsizei count) {
-    Draw(manager, DrawCall::Arrays(mode, first, count));
-}
-
-void Es1StereoLayer::glDrawElements(StereoManager& manager, GLenum mode, GLsizei count,
-                                    GLenum type, const void* indices) {
-    Draw(manager, DrawCall::Elements(mode, count, type, indices));
-}
-
 void Es1StereoLayer::Draw(StereoManager& manager, const DrawCall& draw) {
     const MatrixSnapshot snapshot;
     const StereoProfile& profile = *manager.m_profile;

@@ -45,10 +45,23 @@ public:
     // The record of `texture`; null for names past the table, which are not tracked.
     TextureRecord* TextureRecordOf(GLuint texture);
     // The record of `framebuffer`, claimed for it when free. Names share a slot modulo the
-    // table size; null when another live framebuffer holds it, or for framebuffer 0.
-    FramebufferRecord* FramebufferRecordOf(GLuint framebuffer);
+    // table size; null when another framebuffer holds it, or for framebuffer 0.
+    FramebufferRecord* ClaimFramebufferRecord(GLuint framebuffer);
+    // The record that `framebuffer` claimed; null when it has none.
+    const FramebufferRecord* FindFramebufferRecord(GLuint framebuffer) const;
     // Forgets everything recorded for `texture` (glDeleteTextures).
     void ForgetTexture(GLuint texture);
+
+    // What the tracking layers note of the application's calls.
+    void NoteBoundTexture(GLuint texture);
+    void NoteBoundFramebuffer(GLuint framebuffer) { m_current_framebuffer = framebuffer; }
+    void NoteDeletedTextures(GLsizei count, const GLuint* textures);
+    // Marks `texture` as a framebuffer's colour texture; its record, or null for texture 0
+    // and untracked names.
+    TextureRecord* NoteAttachedTexture(GLuint texture);
+    // glTexImage2D's arguments, kept for the current texture once it was bound.
+    void NoteTexImage(GLenum target, GLint level, GLint internalformat, GLsizei width,
+                      GLsizei height, GLint border, GLenum format, GLenum type);
 
     GLuint m_current_texture;
     GLuint m_current_framebuffer;

@@ -139,12 +139,12 @@ TEST(GlObjectTrackerTest, NamesPastTheTablesGetNoRecord) {
     EXPECT_EQ(tracker.TextureRecordOf(12)->m_width, 0u);
 
     // 3 and 67 share a slot: the second gets none rather than the first one's size.
-    ovo::FramebufferRecord* first = tracker.FramebufferRecordOf(3);
+    ovo::FramebufferRecord* first = tracker.ClaimFramebufferRecord(3);
     ASSERT_NE(first, nullptr);
     first->m_width = 640;
-    EXPECT_EQ(tracker.FramebufferRecordOf(67), nullptr);
-    EXPECT_EQ(tracker.FramebufferRecordOf(3), first);
-    EXPECT_EQ(tracker.FramebufferRecordOf(0), nullptr);
+    EXPECT_EQ(tracker.ClaimFramebufferRecord(67), nullptr);
+    EXPECT_EQ(tracker.ClaimFramebufferRecord(3), first);
+    EXPECT_EQ(tracker.ClaimFramebufferRecord(0), nullptr);
 }
 
 }  // namespace

@@ -1,0 +1,67 @@
+#include "stereo/depth_shift.h"
+
+#include <cstdint>
+#include <cstdlib>
+#include <cstring>
+
+#include "core/raw_gl.h"
+#include "core/stereo_manager.h"
+#include "stereo/eye_viewport.h"
+#include "stereo/glsl_rewriter.h"
+
+namespace ovo {
+
+namespace {
+
+// Room the buffers keep beyond the source and the inserted text.
+constexpr int64_t SOURCE_SLACK = 10;
+
+}  // namespace
+
+void InjectDepthShift(GLuint shader) {
+    GLint type = 0;
+    raw::glGetShaderiv(shader, GL_SHADER_TYPE, &type);
+    if (type != GL_VERTEX_SHADER) return;
+    GLint length = 0;  // with the terminating NUL
+    raw::glGetShaderiv(shader, GL_SHADER_SOURCE_LENGTH, &length);
+    const int64_t inserted =
+        static_cast<int64_t>(sizeof(DEPTH_SHIFT_DECLARATION) + sizeof(DEPTH_SHIFT_STATEMENT));
+    if (length <= 0 || length > INT32_MAX - inserted - SOURCE_SLACK) return;
+
+    // Zero-filled: a driver that answers with less than it announced leaves a terminator.
+    char* source = static_cast<char*>(std::calloc(static_cast<size_t>(length + SOURCE_SLACK), 1));
+    char* rewritten =
+        static_cast<char*>(std::malloc(static_cast<size_t>(length + inserted + SOURCE_SLACK)));
+    if (source != nullptr && rewritten != nullptr) {
+        GLsizei read = 0;
+        raw::glGetShaderSource(shader, length, &read, source);
+        GlslRewriter rewriter;
+        rewriter.SetPreString(DEPTH_SHIFT_DECLARATION);
+        rewriter.SetPostString(DEPTH_SHIFT_STATEMENT);
+        // Without an insertion the application's source, set already, stays as it is.
+        if (rewriter.Rewrite(rewritten, source, length, 1) == 1) {
+            const GLchar* strings[1] = {rewritten};
+            const GLint lengths[1] = {static_cast<GLint>(std::strlen(rewritten))};
+            raw::glShaderSource(shader, 1, strings, lengths);
+        }
+        rewriter.Clear();
+    }
+    std::free(source);
+    std::free(rewritten);
+}
+
+void LookUpDepthShift(StereoManager& manager) {
+    GLint program = 0;
+    raw::glGetIntegerv(GL_CURRENT_PROGRAM, &program);
+    manager.m_program = static_cast<GLuint>(program);
+    manager.m_depth_shift_location = raw::glGetUniformLocation(manager.m_program, DEPTH_SHIFT_UNIFORM);
+}
+
+void SetDepthShift(const StereoManager& manager, int eye) {
+    const StereoProfile& profile = *manager.m_profile;
+    const float sign = EyeSign(eye);
+    raw::glUniform2f(manager.m_depth_shift_location, sign * profile.m_eye_angle,
+                     sign * profile.m_eye_distance);
+}
+
+}  // namespace ovo

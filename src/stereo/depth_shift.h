@@ -1,0 +1,32 @@
+#ifndef OVO_STEREO_DEPTH_SHIFT_H
+#define OVO_STEREO_DEPTH_SHIFT_H
+
+#include "core/gl_api.h"
+
+namespace ovo {
+
+class StereoManager;
+
+// The uniform that every rewritten vertex shader declares: x is the depth threshold, y
+// the shift gain, both negated for eye 1.
+constexpr char DEPTH_SHIFT_UNIFORM[] = "uZpDepthShift";
+constexpr char DEPTH_SHIFT_DECLARATION[] = "uniform vec2 uZpDepthShift;\n";
+// Moves clip-space x by the gain times how far the vertex lies behind the threshold.
+constexpr char DEPTH_SHIFT_STATEMENT[] =
+    "gl_Position.x = gl_Position.x + (uZpDepthShift.y * min((uZpDepthShift.x * "
+    "gl_Position.w) - gl_Position.z, 0.0));\n";
+
+// After the application's glShaderSource: a vertex shader's source is read back and set
+// again with the declaration and the statement inserted. A shader in which no place for
+// them is found keeps the application's source.
+void InjectDepthShift(GLuint shader);
+
+// The current program and the uniform's location in it (-1 when it has none), looked up
+// at every draw so that nothing goes stale.
+void LookUpDepthShift(StereoManager& manager);
+// The uniform's value for `eye` in the current program.
+void SetDepthShift(const StereoManager& manager, int eye);
+
+}  // namespace ovo
+
+#endif
