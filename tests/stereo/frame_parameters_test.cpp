@@ -80,6 +80,7 @@ TEST_F(FrameParametersTest, EachFormRampsItsOwnParameter) {
 }
 
 TEST_F(FrameParametersTest, ASteplessRampTakesOneStep) {
+    Profile().m_ramp_param = ovo::STEREO_AXIS_X;
     Profile().m_ramp_steps = 0.0f;
     Profile().m_eye_distance_set = 0.5f;
     StartFrame();

@@ -1,0 +1,271 @@
+// The OpenGL ES 2.0 layers on the recording vendor: the exact calls of the shader
+// injection, of each draw path and of the render-texture bookkeeping.
+#include <cstring>
+
+#include "stereo/es2_scaled_layer.h"
+#include "stereo/es2_stereo_layer.h"
+#include "stereo/eye_texture.h"
+#include "stereo/gl_object_tracker.h"
+#include "stereo/gl_state_guard.h"
+#include "stereo_fixture.h"
+
+namespace {
+
+using Calls = std::vector<std::string>;
+
+constexpr GLuint PROGRAM = 9;
+constexpr GLint LOCATION = 4;
+
+class Es2LayerTest : public StereoFixture {
+protected:
+    void SetUp() override {
+        StereoFixture::SetUp();
+        ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
+        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CURRENT_PROGRAM,
+                                       {static_cast<GLint>(PROGRAM)});
+        recorded_calls::AnswerResult(ovo::GL_ENTRY_glGetUniformLocation, PROGRAM, LOCATION);
+        BoundFramebuffer(0);
+        Manager().m_objects->m_current_framebuffer = 0;
+        Manager().m_objects->m_current_texture = 0;
+        ResetRecorder();
+    }
+
+    static void BoundFramebuffer(GLint framebuffer) {
+        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING,
+                                       {framebuffer});
+    }
+
+    // The shader's type and source as the driver answers them.
+    static void DriverShader(GLenum type, const char* source) {
+        const GLint length = static_cast<GLint>(std::strlen(source) + 1);
+        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetShaderiv, GL_SHADER_TYPE,
+                                       {static_cast<GLint>(type)});
+        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetShaderiv, GL_SHADER_SOURCE_LENGTH,
+                                       {length});
+        recorded_calls::AnswerBytes(ovo::GL_ENTRY_glGetShaderSource, length, source, length);
+    }
+
+    ovo::Es2StereoLayer m_direct{ovo::LAYER_SUBMODE_DIRECT};
+    ovo::Es2StereoLayer m_tracked{ovo::LAYER_SUBMODE_TRACKED};
+    ovo::Es2ScaledLayer m_scaled;
+};
+
+TEST(Es2StereoLayerSubmode, OnlyTheOneGameIsTracked) {
+    EXPECT_EQ(ovo::Es2StereoLayer::SubmodeFor("com.vectorunit.green"), ovo::LAYER_SUBMODE_TRACKED);
+    for (const char* name : {"com.vectorunit.green2", "com.vectorunit", "", "no.proc.name"}) {
+        EXPECT_EQ(ovo::Es2StereoLayer::SubmodeFor(name), ovo::LAYER_SUBMODE_DIRECT) << name;
+    }
+}
+
+TEST_F(Es2LayerTest, AVertexShaderIsReadBackAndSetAgainAsOneString) {
+    const char* parts[] = {"void main() {", " gl_Position = vec4(0.0); }"};
+    DriverShader(GL_VERTEX_SHADER, "void main() { gl_Position = vec4(0.0); }");
+    m_direct.glShaderSource(Manager(), 5, 2, parts, nullptr);
+    const Calls expected = {"glShaderSource(5, 2, ptr, null)", "glGetShaderiv(5, 0x8B4F, ptr)",
+                            "glGetShaderiv(5, 0x8B88, ptr)", "glGetShaderSource(5, 41, ptr, ptr)",
+                            "glShaderSource(5, 1, ptr, ptr)"};
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+}
+
+TEST_F(Es2LayerTest, FragmentShadersAndShadersWithoutMainKeepTheApplicationsSource) {
+    const char* source = "void f() { }";
+    DriverShader(GL_FRAGMENT_SHADER, source);
+    m_tracked.glShaderSource(Manager(), 6, 1, &source, nullptr);
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(),
+              Calls({"glShaderSource(6, 1, ptr, null)", "glGetShaderiv(6, 0x8B4F, ptr)"}));
+
+    DriverShader(GL_VERTEX_SHADER, source);
+    ResetRecorder();
+    m_tracked.glShaderSource(Manager(), 6, 1, &source, nullptr);
+    EXPECT_EQ(Only({"glShaderSource"}), Calls({"glShaderSource(6, 1, ptr, null)"}));
+}
+
+TEST_F(Es2LayerTest, AWindowDrawSetsEachEyesUniformThroughTheMask) {
+    Interleave(true);
+    m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    const Calls expected = {
+        "glGetIntegerv(0x8CA6, ptr)", "glEnable(0x0B90)", "glGetIntegerv(0x8B8D, ptr)",
+        "glGetUniformLocation(9, ptr)", "glUniform2f(4, 0.25, 0.5)", "glStencilFunc(0x0202, 1, 1)",
+        "glDrawArrays(4, 0, 3)", "glUniform2f(4, -0.25, -0.5)", "glStencilFunc(0x0202, 0, 1)",
+        "glDrawArrays(4, 0, 3)", "glDisable(0x0B90)"};
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    EXPECT_EQ(Manager().m_program, PROGRAM);
+    EXPECT_EQ(Manager().m_depth_shift_location, LOCATION);
+}
+
+TEST_F(Es2LayerTest, WithoutInterleavingEachEyeDrawsIntoItsHalf) {
+    Interleave(false);
+    Profile().m_split = ovo::STEREO_SPLIT_TOP_BOTTOM;
+    m_direct.glDrawElements(Manager(), GL_TRIANGLES, 6, GL_UNSIGNED_SHORT, nullptr);
+    const Calls expected = {
+        "glGetIntegerv(0x8CA6, ptr)", "glGetIntegerv(0x8B8D, ptr)", "glGetUniformLocation(9, ptr)",
+        "glUniform2f(4, 0.25, 0.5)", "glViewport(0, 240, 800, 240)", "glScissor(0, 240, 800, 240)",
+        "glDrawElements(4, 6, 0x1403, null)", "glUniform2f(4, -0.25, -0.5)",
+        "glViewport(0, 0, 800, 240)", "glScissor(0, 0, 800, 240)",
+        "glDrawElements(4, 6, 0x1403, null)"};
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+}
+
+TEST_F(Es2LayerTest, ADirectDrawIntoTheApplicationsFramebufferIsIssuedOnceUnchanged) {
+    Interleave(true);
+    BoundFramebuffer(3);
+    m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(),
+              Calls({"glGetIntegerv(0x8CA6, ptr)", "glDrawArrays(4, 0, 3)"}));
+}
+
+class TrackedLayerTest : public Es2LayerTest {
+protected:
+    // Texture 5, 128 x 64, attached to framebuffer 3, which stays bound.
+    void MakeRenderTexture() {
+        m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, 5);
+        m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGBA, 128, 64, 0, GL_RGBA,
+                               GL_UNSIGNED_BYTE, nullptr);
+        m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 3);
+        m_tracked.glFramebufferTexture2D(Manager(), GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0,
+                                         GL_TEXTURE_2D, 5, 0);
+    }
+};
+
+TEST_F(TrackedLayerTest, RenderTexturesAndRenderbuffersBecomeTwiceAsWide) {
+    MakeRenderTexture();
+    m_tracked.glRenderbufferStorage(Manager(), GL_RENDERBUFFER, GL_DEPTH_COMPONENT16, 128, 64);
+    const Calls expected = {
+        "glBindTexture(0x0DE1, 5)",
+        "glTexImage2D(0x0DE1, 0, 6408, 128, 64, 0, 0x1908, 0x1401, null)",
+        "glBindFramebuffer(0x8D40, 3)",
+        "glFramebufferTexture2D(0x8D40, 0x8CE0, 0x0DE1, 5, 0)",
+        "glBindTexture(0x0DE1, 5)",
+        "glTexImage2D(0x0DE1, 0, 6408, 256, 64, 0, 0x1908, 0x1401, null)",
+        "glBindTexture(0x0DE1, 5)",
+        "glRenderbufferStorage(0x8D41, 0x81A5, 256, 64)"};
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    const ovo::FramebufferRecord* framebuffer = Manager().m_objects->FindFramebufferRecord(3);
+    ASSERT_NE(framebuffer, nullptr);
+    EXPECT_EQ(framebuffer->m_width, 128u);
+    EXPECT_EQ(framebuffer->m_height, 64u);
+    // 67 shares 3's slot and so has no record of its own.
+    EXPECT_EQ(Manager().m_objects->FindFramebufferRecord(67), nullptr);
+
+    // Deleted, the name is forgotten: a new texture of that name starts unbound.
+    const GLuint name = 5;
+    m_tracked.glDeleteTextures(Manager(), 1, &name);
+    EXPECT_EQ(Manager().m_objects->TextureRecordOf(5)->m_attached, 0u);
+    EXPECT_EQ(Manager().m_objects->TextureRecordOf(5)->m_width, 0u);
+}
+
+TEST_F(TrackedLayerTest, UntrackedNamesAndUnsizedTexturesAreNeverRespecified) {
+    struct Case {
+        GLuint m_texture;
+        bool m_sized;
+    } cases[] = {{0, true}, {4096, true}, {0xFFFFFFFFu, true}, {8, false}};
+    for (const Case& each : cases) {
+        m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, each.m_texture);
+        if (each.m_sized) {
+            m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGBA, 32, 32, 0, GL_RGBA,
+                                   GL_UNSIGNED_BYTE, nullptr);
+        }
+        ResetRecorder();
+        m_tracked.glFramebufferTexture2D(Manager(), GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0,
+                                         GL_TEXTURE_2D, each.m_texture, 0);
+        EXPECT_EQ(recorded_calls::RecordedGlCalls().size(), 1u) << each.m_texture;
+    }
+}
+
+TEST_F(TrackedLayerTest, EachEyeDrawsIntoItsHalfOfTheApplicationsFramebuffer) {
+    Interleave(true);
+    MakeRenderTexture();
+    Manager().m_viewport = {0, 0, 128, 64};
+    ResetRecorder();
+    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    const Calls expected = {
+        "glGetIntegerv(0x8B8D, ptr)", "glGetUniformLocation(9, ptr)", "glViewport(0, 0, 128, 64)",
+        "glUniform2f(4, 0.25, 0.5)", "glDrawArrays(4, 0, 3)", "glViewport(128, 0, 128, 64)",
+        "glUniform2f(4, -0.25, -0.5)", "glDrawArrays(4, 0, 3)"};
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+}
+
+TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
+    Interleave(true);
+    MakeRenderTexture();
+    m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 0);
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
+    recorded_calls::AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_BLEND, 1);
+    recorded_calls::AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, 1);
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGenTextures, 1, {21});
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffers, 1, {22});
+    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);  // makes the eye textures
+    // The vendor gave both the same names; eye 1's texture is told apart here.
+    Manager().m_eye_textures->m_eyes[1].m_texture = 31;
+    ResetRecorder();
+    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    // Both copies sample texture 5 (still bound) into the eye textures' framebuffer; the
+    // window's viewport comes back before the eyes draw, each with its own texture.
+    const Calls expected = {
+        "glGetUniformLocation(9, ptr)", "glDisable(0x0BE2)", "glViewport(0, 0, 128, 64)",
+        "glDisable(0x0B71)", "glBindFramebuffer(0x8D40, 22)", "glDrawArrays(5, 0, 4)",
+        "glBindTexture(0x0DE1, 5)", "glBindFramebuffer(0x8D40, 0)", "glEnable(0x0B71)",
+        "glDisable(0x0B71)", "glBindFramebuffer(0x8D40, 22)", "glDrawArrays(5, 0, 4)",
+        "glBindTexture(0x0DE1, 5)", "glBindFramebuffer(0x8D40, 0)", "glEnable(0x0B71)",
+        "glEnable(0x0BE2)", "glViewport(0, 0, 800, 480)", "glEnable(0x0B90)",
+        "glBindTexture(0x0DE1, 21)", "glUniform2f(4, 0.25, 0.5)", "glStencilFunc(0x0202, 1, 1)",
+        "glDrawArrays(4, 0, 3)", "glBindTexture(0x0DE1, 31)", "glUniform2f(4, -0.25, -0.5)",
+        "glStencilFunc(0x0202, 0, 1)", "glDrawArrays(4, 0, 3)", "glDisable(0x0B90)",
+        "glBindTexture(0x0DE1, 5)"};
+    EXPECT_EQ(Only({"glGetUniformLocation", "glDisable", "glEnable", "glViewport",
+                    "glBindFramebuffer", "glDrawArrays", "glBindTexture", "glUniform2f",
+                    "glStencilFunc"}),
+              expected);
+}
+
+TEST_F(TrackedLayerTest, ClearsCoverTheDoubleWidth) {
+    m_tracked.glClear(Manager(), GL_COLOR_BUFFER_BIT);
+    m_direct.glClear(Manager(), GL_DEPTH_BUFFER_BIT);
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(),
+              Calls({"glScissor(0, 0, 1600, 480)", "glClear(0x4000)", "glClear(0x0100)"}));
+}
+
+TEST_F(Es2LayerTest, TheScaledLayerScalesWindowDrawsAndClearsOnly) {
+    Profile().m_width = 1280;
+    Profile().m_height = 720;
+    Manager().UpdateScale();
+    Manager().m_viewport = {10, 20, 401, 240};
+    Manager().m_scissor = {0, 0, 801, 480};
+    m_scaled.glClear(Manager(), GL_COLOR_BUFFER_BIT);
+    m_scaled.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    m_scaled.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 3);
+    m_scaled.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    // No 0.5 anywhere: 401 x 1.6 = 641.6 gives 641.
+    const Calls expected = {"glScissor(0, 0, 1281, 720)", "glClear(0x4000)",
+                            "glViewport(16, 30, 641, 360)", "glDrawArrays(4, 0, 3)",
+                            "glBindFramebuffer(0x8D40, 3)", "glViewport(10, 20, 401, 240)",
+                            "glDrawArrays(4, 0, 3)"};
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+}
+
+TEST_F(Es2LayerTest, TheStateGuardPutsBackOnlyWhatItSavedAndOnlyOnce) {
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv,
+                                   GL_VERTEX_ATTRIB_ARRAY_ENABLED, {1});
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv,
+                                   GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, {12});
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv, GL_VERTEX_ATTRIB_ARRAY_SIZE,
+                                   {3});
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv, GL_VERTEX_ATTRIB_ARRAY_TYPE,
+                                   {GL_FLOAT});
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv,
+                                   GL_VERTEX_ATTRIB_ARRAY_STRIDE, {24});
+    recorded_calls::AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, 0);
+    ovo::GlStateGuard guard;
+    guard.Save(ovo::GUARD_TEXTURE | ovo::GUARD_ATTRIBUTE_1 | ovo::GUARD_DEPTH_TEST);
+    ResetRecorder();
+    guard.Restore();
+    guard.Restore();
+    const Calls expected = {"glBindTexture(0x0DE1, 5)", "glEnableVertexAttribArray(1)",
+                            "glBindBuffer(0x8892, 12)",
+                            "glVertexAttribPointer(1, 3, 0x1406, 0, 24, null)",
+                            "glDisable(0x0B71)"};
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+}
+
+}  // namespace
