@@ -5,6 +5,7 @@
 
 #include "core/driver_hooks.h"
 #include "core/missing_driver_function.h"
+#include "core/raw_egl.h"
 #include "platform/device_path.h"
 
 namespace ovo {
@@ -117,6 +118,22 @@ bool ResolveDriver() {
     FillGlHooks(g_vendor_driver.m_es2_hooks, gles2, resolver);
     return true;
 }
+
+template <typename Result>
+Result NoVendorAnswer() {
+    return Result();
+}
+
+namespace vendor_egl::unbound {
+#define OVO_EGL_ENTRY(index, result, name, params, args)                       \
+    result name params {                                                       \
+        ResolveDriver();                                                       \
+        auto function = g_vendor_driver.m_egl.name;                            \
+        return function != nullptr ? function args : NoVendorAnswer<result>(); \
+    }
+#define OVO_EGL_NULL(index, result, name, params, args)
+#include "core/egl_entry_table.inc"
+}  // namespace vendor_egl::unbound
 
 void SelectThreadHooks(bool context_bound) {
     const DriverHooks* hooks = &g_vendor_driver.m_no_context_hooks;

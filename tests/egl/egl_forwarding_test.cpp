@@ -5,6 +5,7 @@
 
 #include <utility>
 
+#include "core/driver_hooks.h"
 #include "core/entry_tables.h"
 #include "support/forwarding_check.h"
 #include "support/vendor_root.h"
@@ -33,10 +34,26 @@ Result CallWithDistinctArguments(Result (*function)(Arguments...)) {
     return CallWithDistinctArguments(function, std::index_sequence_for<Arguments...>{});
 }
 
-// An application that skips eglGetDisplay finds no vendor behind the EGL functions yet:
-// every forwarder answers 0 (EGL_FALSE, EGL_NO_SURFACE, ...) instead of jumping through null.
-TEST(EglForwardingTest, BeforeTheDriverIsBoundEveryForwarderAnswersZero) {
+// Clients ask eglGetError or eglQueryString(EGL_NO_DISPLAY, EGL_EXTENSIONS) before any
+// eglGetDisplay. Each forwarder is called here as the first EGL call of the process: with
+// the driver table empty again, it binds the driver and brings the vendor's answer back.
+TEST(EglForwardingTest, BeforeTheFirstDisplayEveryForwarderBindsTheDriverAndReachesTheVendor) {
     vendor_root::InstallRecorder();
+    uint32_t walked = 0;
+#define OVO_EGL_ENTRY(index, result, name, params, args)                                    \
+    ovo::g_vendor_driver.m_egl = ovo::EglDriverTable();                                     \
+    ExpectForwarded<DistinctEglArguments>(#name, index, RECORDER_API_EGL, index, &::name); \
+    ++walked;
+#define OVO_EGL_INTERCEPT(index, result, name, params, args)
+#define OVO_EGL_NULL(index, result, name, params, args)
+#include "core/egl_entry_table.inc"
+    EXPECT_EQ(walked, 31u);
+}
+
+// Without a vendor every forwarder answers 0 (EGL_FALSE, EGL_NO_SURFACE, ...) instead of
+// jumping through null.
+TEST(EglForwardingTest, WithoutAVendorEveryForwarderAnswersZero) {
+    vendor_root::Reset();
     uint32_t walked = 0;
 #define OVO_EGL_ENTRY(index, result, name, params, args)                              \
     EXPECT_EQ(CallWithDistinctArguments(&::name), static_cast<result>(0)) << #name; \
