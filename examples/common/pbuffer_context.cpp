@@ -29,7 +29,8 @@ bool PbufferContext::Fail(const char* call) {
     return false;
 }
 
-bool PbufferContext::ChooseConfig(EGLint client_version, EGLConfig* config) {
+bool PbufferContext::ChooseConfig(EGLint client_version, EGLint stencil_bits,
+                                  EGLConfig* config) {
     const EGLint renderable = client_version >= 2 ? EGL_OPENGL_ES2_BIT : EGL_OPENGL_ES_BIT;
     const EGLint attributes[] = {EGL_SURFACE_TYPE, EGL_PBUFFER_BIT,
                                  EGL_RENDERABLE_TYPE, renderable,
@@ -38,6 +39,7 @@ bool PbufferContext::ChooseConfig(EGLint client_version, EGLConfig* config) {
                                  EGL_BLUE_SIZE, COLOR_BITS,
                                  EGL_ALPHA_SIZE, COLOR_BITS,
                                  EGL_DEPTH_SIZE, DEPTH_BITS,
+                                 EGL_STENCIL_SIZE, stencil_bits,
                                  EGL_NONE};
     EGLConfig configs[EGL_CONFIG_CAPACITY];
     EGLint count = 0;
@@ -57,8 +59,8 @@ bool PbufferContext::ChooseConfig(EGLint client_version, EGLConfig* config) {
     return false;
 }
 
-bool PbufferContext::Create(const char* program, EGLint client_version, int32_t width,
-                            int32_t height) {
+bool PbufferContext::Create(const char* program, EGLint client_version, EGLint stencil_bits,
+                            int32_t width, int32_t height) {
     m_program = program;
     m_display = eglGetDisplay(EGL_DEFAULT_DISPLAY);
     if (m_display == EGL_NO_DISPLAY) return Fail("eglGetDisplay");
@@ -71,7 +73,7 @@ bool PbufferContext::Create(const char* program, EGLint client_version, int32_t 
     if (!eglBindAPI(EGL_OPENGL_ES_API)) return Fail("eglBindAPI");
 
     EGLConfig config = nullptr;
-    if (!ChooseConfig(client_version, &config)) return false;
+    if (!ChooseConfig(client_version, stencil_bits, &config)) return false;
 
     const EGLint surface_attributes[] = {EGL_WIDTH, width, EGL_HEIGHT, height, EGL_NONE};
     m_surface = eglCreatePbufferSurface(m_display, config, surface_attributes);

@@ -8,12 +8,14 @@
 namespace ovo_sample {
 
 // A game's EGL start-up on an off-screen surface: the default display, an RGBA8 config
-// with a depth buffer, a pbuffer and a current context of one OpenGL ES version.
+// with a depth buffer (and at least `stencil_bits` of stencil), a pbuffer and a current
+// context of one OpenGL ES version.
 class PbufferContext {
 public:
     // `program` names the sample in error messages. False after printing which EGL call
     // failed; Destroy still releases whatever was made.
-    bool Create(const char* program, EGLint client_version, int32_t width, int32_t height);
+    bool Create(const char* program, EGLint client_version, EGLint stencil_bits, int32_t width,
+                int32_t height);
 
     // False after printing the failure.
     bool SwapBuffers();
@@ -22,7 +24,7 @@ public:
     bool Destroy();
 
 private:
-    bool ChooseConfig(EGLint client_version, EGLConfig* config);
+    bool ChooseConfig(EGLint client_version, EGLint stencil_bits, EGLConfig* config);
     bool Fail(const char* call);
 
     const char* m_program = "sample";

@@ -47,8 +47,13 @@ int RunSample(const SampleInfo& info, SampleScene* scene, int argc, char** argv)
 
 int RunSample(const SampleInfo& info, const SampleArgs& args, SampleScene* scene) {
     const PixelSize size = args.m_size;
+    // A converter that interleaves the eyes asks every config for a stencil buffer, and on
+    // Mesa those configs hold 24 bits of depth instead of 16: one eye of the pair is rendered
+    // on such a config too, so that depth ties (a crate standing on the floor) break alike.
+    const EGLint stencil_bits = args.m_reference.HasEye() ? 1 : 0;
     PbufferContext context;
-    if (!context.Create(info.m_program, info.m_client_version, size.m_width, size.m_height)) {
+    if (!context.Create(info.m_program, info.m_client_version, stencil_bits, size.m_width,
+                        size.m_height)) {
         context.Destroy();
         return SAMPLE_EXIT_FAILED;
     }
