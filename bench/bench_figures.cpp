@@ -16,8 +16,10 @@ void FigureReporter::ReportRuns(const std::vector<Run>& runs) {
         // The median comes after the repetitions it sums up, so it has the last word.
         if (run.run_type != Run::RT_Iteration && !median) continue;
         const double to_ns = 1e9 / benchmark::GetTimeUnitMultiplier(run.time_unit);
-        m_figures[run.run_name.function_name] = {run.GetAdjustedCPUTime() * to_ns,
-                                                 run.GetAdjustedRealTime() * to_ns};
+        const auto bytes = run.counters.find("bytes_per_second");
+        m_figures[run.run_name.function_name] = {
+            run.GetAdjustedCPUTime() * to_ns, run.GetAdjustedRealTime() * to_ns,
+            bytes != run.counters.end() ? bytes->second.value : 0.0};
     }
 }
 
@@ -25,7 +27,8 @@ std::string FormatFigures(const BenchFigureTable& figures) {
     std::string text;
     char line[256];
     for (const auto& [name, figure] : figures) {
-        std::snprintf(line, sizeof(line), " %.6g %.6g\n", figure.m_cpu_ns, figure.m_real_ns);
+        std::snprintf(line, sizeof(line), " %.6g %.6g %.6g\n", figure.m_cpu_ns, figure.m_real_ns,
+                      figure.m_bytes_per_second);
         text += name + line;
     }
     return text;
@@ -38,7 +41,9 @@ bool ParseFigures(const std::string& text, BenchFigureTable* figures) {
         std::istringstream fields(line);
         std::string name;
         BenchFigure figure;
-        if (!(fields >> name >> figure.m_cpu_ns >> figure.m_real_ns)) return false;
+        if (!(fields >> name >> figure.m_cpu_ns >> figure.m_real_ns >> figure.m_bytes_per_second)) {
+            return false;
+        }
         (*figures)[name] = figure;
     }
     return true;

@@ -7,11 +7,13 @@
 #include <string>
 #include <vector>
 
-// What one benchmark measured, per iteration in nanoseconds: the median of the repetitions
-// when there are several, else the one run.
+// What one benchmark measured, per iteration in nanoseconds, and the bytes it processed per
+// second of processor time (0 when it counts none): the median of the repetitions when
+// there are several, else the one run.
 struct BenchFigure {
     double m_cpu_ns;
     double m_real_ns;
+    double m_bytes_per_second;
 };
 
 // By benchmark name, as registered.
@@ -31,7 +33,7 @@ private:
     BenchFigureTable m_figures;
 };
 
-// One line per figure, "NAME CPU_NS REAL_NS"; names hold no spaces.
+// One line per figure, "NAME CPU_NS REAL_NS BYTES_PER_SECOND"; names hold no spaces.
 std::string FormatFigures(const BenchFigureTable& figures);
 
 // Adds the lines of FormatFigures to `figures`; false on a malformed line.

@@ -8,20 +8,22 @@
 #include "part_process.h"
 
 TEST(BenchFigures, KeepSixDigitsThroughTheirText) {
-    const BenchFigureTable sent = {{"shader/direct", {5.1234567, 7.25}},
-                                   {"scene/stereo", {12345678.9, 2.5e7}}};
-    BenchFigureTable received = {{"plain/library", {80.0, 120.0}}};
+    const BenchFigureTable sent = {{"es1_shader/direct", {5.1234567, 7.25, 0.0}},
+                                   {"es1_scene/stereo", {12345678.9, 2.5e7, 0.0}},
+                                   {"rewriter/corpus", {9.5e5, 9.75e5, 123456789.0}}};
+    BenchFigureTable received = {{"es1_plain/library", {80.0, 120.0, 0.0}}};
     ASSERT_TRUE(ParseFigures(FormatFigures(sent), &received));
-    ASSERT_EQ(received.size(), 3u);
-    EXPECT_DOUBLE_EQ(received["shader/direct"].m_cpu_ns, 5.12346);
-    EXPECT_DOUBLE_EQ(received["shader/direct"].m_real_ns, 7.25);
-    EXPECT_DOUBLE_EQ(received["scene/stereo"].m_cpu_ns, 12345700.0);
-    EXPECT_DOUBLE_EQ(received["plain/library"].m_real_ns, 120.0);
+    ASSERT_EQ(received.size(), 4u);
+    EXPECT_DOUBLE_EQ(received["es1_shader/direct"].m_cpu_ns, 5.12346);
+    EXPECT_DOUBLE_EQ(received["es1_shader/direct"].m_real_ns, 7.25);
+    EXPECT_DOUBLE_EQ(received["es1_scene/stereo"].m_cpu_ns, 12345700.0);
+    EXPECT_DOUBLE_EQ(received["rewriter/corpus"].m_bytes_per_second, 123457000.0);
+    EXPECT_DOUBLE_EQ(received["es1_plain/library"].m_real_ns, 120.0);
 }
 
 TEST(BenchFigures, TurnDownMalformedLines) {
-    const char* const malformed[] = {"shader/direct 5.0\n", "shader/direct five 6\n",
-                                     "shader/direct 5 6\n\n", "5 6\n"};
+    const char* const malformed[] = {"es1_shader/direct 5.0 6\n", "es1_shader/direct five 6 0\n",
+                                     "es1_shader/direct 5 6 0\n\n", "5 6 0\n"};
     for (const char* text : malformed) {
         BenchFigureTable figures;
         EXPECT_FALSE(ParseFigures(text, &figures)) << text;
