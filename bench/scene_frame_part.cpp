@@ -25,8 +25,8 @@ struct SceneFunctions {
     decltype(&StereoSceneTakeGlError) m_take_gl_error;
 };
 
-bool OpenScene(SceneFunctions* scene) {
-    void* module = OpenLibrary(OVO_BENCH_SCENE_MODULE);
+bool OpenScene(const char* module_path, SceneFunctions* scene) {
+    void* module = OpenLibrary(module_path);
     *scene = {LibrarySymbol<decltype(&StereoSceneStart)>(module, "StereoSceneStart"),
               LibrarySymbol<decltype(&StereoSceneDrawFrame)>(module, "StereoSceneDrawFrame"),
               LibrarySymbol<decltype(&StereoSceneStencilBits)>(module, "StereoSceneStencilBits"),
@@ -54,7 +54,10 @@ bool RegisterSceneBenchmark(const SceneCase& scene_case) {
     // Mesa headless, unless the caller chose a platform.
     setenv("EGL_PLATFORM", "surfaceless", 0);
     static SceneFunctions scene;
-    if (!installed || !OpenScene(&scene) || !scene.m_start(SCENE_WIDTH, SCENE_HEIGHT)) return false;
+    if (!installed || !OpenScene(scene_case.m_module, &scene) ||
+        !scene.m_start(SCENE_WIDTH, SCENE_HEIGHT)) {
+        return false;
+    }
     // The column mask lives in the stencil buffer, which the library asks for whenever it
     // interleaves: without one the profile did not take.
     if (scene_case.m_profile != nullptr && scene.m_stencil_bits() == 0) {

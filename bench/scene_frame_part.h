@@ -1,9 +1,10 @@
 #ifndef OVO_BENCH_SCENE_FRAME_PART_H
 #define OVO_BENCH_SCENE_FRAME_PART_H
 
-// The OpenGL ES 1.1 sample scene on Mesa through the library, flat or in stereo.
+// A sample scene on Mesa through the library, flat or in stereo.
 struct SceneCase {
     const char* m_name;     // the part's name and its benchmark's name
+    const char* m_module;   // the sample's scene module (stereo_scene_frames.h)
     const char* m_profile;  // the binary profile installed first; null: none (flat)
 };
 

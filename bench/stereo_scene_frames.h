@@ -3,13 +3,13 @@
 
 #include <cstdint>
 
-// The OpenGL ES 1.1 sample scene in a module of its own, linked with one copy of the
-// library, so that the scene's EGL and GL calls bind to that copy and to nothing else in
-// the benchmark. The benchmark opens the module with dlopen and calls these.
+// A sample scene in a module of its own, linked with one copy of the library, so that the
+// scene's EGL and GL calls bind to that copy and to nothing else in the benchmark. There is
+// one module per sample; the benchmark opens one with dlopen and calls these.
 extern "C" {
 
-// Makes a width x height pbuffer current through the library with an OpenGL ES 1.1
-// context and builds the scene at that size; false after printing why.
+// Makes a width x height pbuffer current through the library with a context of the
+// sample's OpenGL ES version and builds the scene at that size; false after printing why.
 bool StereoSceneStart(int32_t width, int32_t height);
 
 // Draws the next frame, swaps and waits until the frame is rendered; false when the swap
