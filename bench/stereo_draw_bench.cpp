@@ -1,10 +1,11 @@
-// What the stereo draw path costs. Each stereo layer on the recording vendor in its
-// do-nothing mode: a draw call through the library's export against the vendor's own
-// called directly, the difference being the library's own processor time per application
-// draw (a pair of vendor draws for the stereo layers). And each sample scene at 800x480 on
-// Mesa through the library, flat and interleaved in stereo, swapping every frame so that
-// the column mask is drawn as in a game. Every part runs in a process of its own; a
-// summary of all of them follows at the end.
+// What the stereo path costs. The vertex-shader rewriter's throughput on a corpus of real
+// shaders, in bytes of source per second of processor time. Each stereo layer on the
+// recording vendor in its do-nothing mode: a draw call through the library's export
+// against the vendor's own called directly, the difference being the library's own
+// processor time per application draw (a pair of vendor draws for the stereo layers). And
+// each sample scene at 800x480 on Mesa through the library, flat and interleaved in
+// stereo, swapping every frame so that the column mask is drawn as in a game. Every part
+// runs in a process of its own; a summary of all of them follows at the end.
 #include <benchmark/benchmark.h>
 
 #include <cstdio>
@@ -14,6 +15,7 @@
 #include "bench_figures.h"
 #include "layer_draw_part.h"
 #include "part_process.h"
+#include "rewriter_throughput_part.h"
 #include "scene_frame_part.h"
 
 namespace {
@@ -65,10 +67,15 @@ const SceneVariant SCENE_VARIANTS[] = {
     {SCENE_STEREO, OVO_BENCH_PROFILE_INTERLEAVE},
 };
 
+// The rewriter's part and its benchmark, as that part names it.
+constexpr char REWRITER_PART[] = "rewriter";
+constexpr char REWRITER_BENCHMARK[] = "rewriter/corpus";
+
 constexpr double BAR_ADDED_NS = 500.0;
 constexpr double BAR_FRAME_RATIO = 2.0;
 
 bool RegisterPart(const std::string& part) {
+    if (part == REWRITER_PART) return RegisterRewriterBenchmark(OVO_BENCH_SHADER_CORPUS);
     for (const LayerCase& layer_case : LAYER_CASES) {
         if (part == layer_case.m_name) return RegisterLayerBenchmarks(layer_case);
     }
@@ -98,6 +105,18 @@ const BenchFigure* Find(const BenchFigureTable& figures, const std::string& name
 }
 
 const char* BarVerdict(bool met) { return met ? "met" : "NOT met"; }
+
+void PrintRewriterSummary(const BenchFigureTable& figures) {
+    const BenchFigure* rewriter = Find(figures, REWRITER_BENCHMARK);
+    std::printf("\nVertex-shader rewriter on the shaders of %s, processor time:\n",
+                OVO_BENCH_SHADER_CORPUS);
+    if (rewriter == nullptr) {
+        std::printf("not measured\n");
+        return;
+    }
+    std::printf("%.1f MB/s (10^6 bytes of source per second)\n",
+                rewriter->m_bytes_per_second / 1e6);
+}
 
 void PrintLayerSummary(const BenchFigureTable& figures) {
     std::printf("\nAdded by the library per application draw, processor time "
@@ -147,6 +166,7 @@ int RunAllParts(int argc, char** argv) {
     benchmark::Initialize(&argc, argv);
     if (benchmark::ReportUnrecognizedArguments(argc, argv)) return 1;
     BenchFigureTable figures;
+    if (!RunPart(argv[0], REWRITER_PART, arguments, &figures)) return 1;
     for (const LayerCase& layer_case : LAYER_CASES) {
         const char* process_name =
             layer_case.m_process_name != nullptr ? layer_case.m_process_name : argv[0];
@@ -158,6 +178,7 @@ int RunAllParts(int argc, char** argv) {
             if (!RunPart(argv[0], part, arguments, &figures)) return 1;
         }
     }
+    PrintRewriterSummary(figures);
     PrintLayerSummary(figures);
     for (const SceneSample& sample : SCENE_SAMPLES) PrintSceneSummary(sample, figures);
     return 0;
