@@ -114,18 +114,16 @@ TEST_F(FrameParametersTest, TheFrameBoundaryTakesTheViewersEstimateAndRestartsTh
     ovo::Mat4Identity(modelview);
     modelview[14] = -4.0f;
     Manager().m_viewer->Observe(projection, modelview);
-    ovo::ViewerTracker reference(true);
-    reference.Observe(projection, modelview);
-    reference.EstimateEyes();
 
     Manager().m_depth_plane = 3.0f;
     Manager().m_frame_draws = 17;
     Manager().m_last_texture = 9;
     const uint32_t frame = Manager().m_frame_number;
     ovo::BeginFrame(Manager());
-    EXPECT_NE(reference.EyeDistance(), 0.0f);
-    EXPECT_EQ(Profile().m_eye_distance, reference.EyeDistance());
-    EXPECT_EQ(Profile().m_eye_angle, reference.EyeAngle());
+    // The origin lands at depth 2/3, which unprojects from the screen's centre to
+    // (4, 0, -4): distance 4, angle atan2(4, 4) = 45 degrees.
+    EXPECT_NEAR(Profile().m_eye_distance, 4.0f, 1e-5);
+    EXPECT_NEAR(Profile().m_eye_angle, 45.0f, 1e-4);
     EXPECT_EQ(Manager().m_depth_plane, -5.0f);
     EXPECT_EQ(Manager().m_frame_draws, 0u);
     EXPECT_EQ(Manager().m_last_texture, 0u);
