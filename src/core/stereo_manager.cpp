@@ -4,7 +4,9 @@
 #include <unistd.h>
 
 #include <cstdio>
+#include <cstdlib>
 #include <cstring>
+#include <new>
 
 #include "config/debug_config.h"
 #include "core/gl_layer.h"
@@ -26,14 +28,30 @@ namespace {
 constexpr char NO_PROCESS_NAME[] = "no.proc.name";
 
 bool IsWhitespace(char byte) { return (byte >= 9 && byte <= 13) || byte == ' '; }
+
+// The manager's storage, and what the calls after its release use instead of the owned
+// objects. Neither is ever destroyed: exit handlers that run later still find them.
+struct LateCallObjects {
+    PassThroughLayer m_layer;
+    OverlayTarget m_overlay{0, 0, 0};
+    ViewerTracker m_viewer{false};
+};
+alignas(StereoManager) unsigned char g_manager_storage[sizeof(StereoManager)];
+alignas(LateCallObjects) unsigned char g_late_call_storage[sizeof(LateCallObjects)];
+
+void ReleaseManagerAtExit() { StereoManager::instance().ReleaseAtExit(); }
 }  // namespace
 
 std::atomic<StereoManager*> StereoManager::m_instance{nullptr};
 
 StereoManager& StereoManager::Build() {
-    static StereoManager manager;
-    m_instance.store(&manager, std::memory_order_release);
-    return manager;
+    static StereoManager* const manager = [] {
+        StereoManager* built = new (g_manager_storage) StereoManager();
+        std::atexit(ReleaseManagerAtExit);
+        return built;
+    }();
+    m_instance.store(manager, std::memory_order_release);
+    return *manager;
 }
 
 StereoManager::StereoManager()
@@ -78,23 +96,25 @@ StereoManager::StereoManager()
     UpdateScale();
 }
 
-StereoManager::~StereoManager() {
+void StereoManager::ReleaseAtExit() {
     delete m_objects;
     delete m_layer;
     delete m_viewer;
     delete m_debug;
     delete m_overlay;
-    delete m_profile;
+    // The profile stays, back at its defaults with stereo off: the EGL calls read it.
+    static_cast<StereoProfileFields&>(*m_profile) = StereoProfileFields();
+    m_profile->m_mode = STEREO_MODE_OFF;
     // Its GL objects went with their context; only the record is freed.
     delete m_eye_textures;
     // Released last: nothing that goes before draws any more.
     delete m_composer;
+    LateCallObjects* late = new (g_late_call_storage) LateCallObjects();
     m_objects = nullptr;
-    m_layer = nullptr;
-    m_viewer = nullptr;
+    m_layer = &late->m_layer;
+    m_viewer = &late->m_viewer;
     m_debug = nullptr;
-    m_overlay = nullptr;
-    m_profile = nullptr;
+    m_overlay = &late->m_overlay;
     m_eye_textures = nullptr;
     m_composer = nullptr;
     m_interleave = false;

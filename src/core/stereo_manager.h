@@ -32,16 +32,19 @@ constexpr size_t PROCESS_NAME_CAPACITY = 1024;
 // points, the layers and the EGL calls read and write them directly.
 class StereoManager {
 public:
-    // The single manager; the first call in the process builds it (thread-safe), and it
-    // is destroyed at process exit. Inline: every GL call starts here, and once the
-    // manager exists that costs one load and a test.
+    // The single manager; the first call in the process builds it (thread-safe), and at
+    // process exit it releases what it owns. Inline: every GL call starts here, and once
+    // the manager exists that costs one load and a test.
     static StereoManager& instance() {
         StereoManager* manager = m_instance.load(std::memory_order_acquire);
         return __builtin_expect(manager != nullptr, 1) ? *manager : Build();
     }
 
     StereoManager();
-    ~StereoManager();
+    // Releases the layer and the owned objects at process exit. The manager itself stays,
+    // with a layer that passes every call through and stereo off, for the calls that
+    // still come: from an exit handler, or from a thread that runs on.
+    void ReleaseAtExit();
     StereoManager(const StereoManager&) = delete;
     StereoManager& operator=(const StereoManager&) = delete;
 

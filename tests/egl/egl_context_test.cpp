@@ -145,28 +145,12 @@ TEST_F(EglContextTest, EveryDisplayRequestDeletesTheProfileFile) {
     EXPECT_NE(eglGetDisplay(EGL_DEFAULT_DISPLAY), EGL_NO_DISPLAY) << "no file is no error";
 }
 
-// A profile file as the companion application writes it: header, then 24 items.
-std::string ProfileFile(const std::vector<std::pair<uint32_t, std::vector<uint32_t>>>& items) {
-    std::string bytes;
-    auto word = [&bytes](uint32_t value, int size) {
-        for (int shift = 8 * (size - 1); shift >= 0; shift -= 8) bytes += static_cast<char>(value >> shift);
-    };
-    word(0, 4), word(1, 4), word(0, 4), word(0, 4);  // the second word marks the file valid
-    for (size_t item = 0; item < 24; ++item) {
-        uint32_t id = item < items.size() ? items[item].first : 0;
-        const std::vector<uint32_t> payload = item < items.size() ? items[item].second : std::vector<uint32_t>{};
-        word(id, 4), word(0x1003, 2), word(static_cast<uint32_t>(payload.size()), 2);
-        for (uint32_t value : payload) word(value, 4);
-    }
-    return bytes;
-}
-
 TEST(EglProfileTest, AProfileFileTurnsStereoOnForTheProcess) {
     vendor_root::InstallRecorder();
     std::filesystem::remove_all(OVO_TEST_DEVICE_ROOT "/sdcard");
     device_files::Write("/sdcard/duoscope/.keep", "");
     device_files::Write("/sdcard/stereoconv/game/stereo_gm.ovo",
-                        ProfileFile({{0x2301, {1}}, {0x2403, {1}}, {0x2201, {800, 480}}, {0x2101, {0x3102}}}));
+                        device_files::ProfileFile({{0x2301, {1}}, {0x2403, {1}}, {0x2201, {800, 480}}, {0x2101, {0x3102}}}));
     EglSession egl;
     egl.Open();
     EXPECT_FALSE(std::filesystem::exists(device_files::Path("/sdcard/stereoconv/game/stereo_gm.ovo")));
