@@ -4,9 +4,13 @@ set -euo pipefail
 packages=(g++ cmake make python3 binutils pkg-config libpng-dev
   libgtest-dev libbenchmark-dev
   libegl-dev libgles-dev libegl-mesa0 libgl1-mesa-dri)
+# Installed for this machine's architecture (or for all): on a machine that also holds
+# another architecture's copy (scripts/armhf.sh), an unqualified name is ambiguous to dpkg.
+native="$(dpkg --print-architecture)"
 missing=()
 for package in "${packages[@]}"; do
-  dpkg -s "$package" >/dev/null 2>&1 || missing+=("$package")
+  dpkg-query -W -f='${Architecture} ${db:Status-Abbrev}\n' "$package" 2>/dev/null |
+    grep -Eq "^($native|all) ii" || missing+=("$package")
 done
 if [ ${#missing[@]} -gt 0 ]; then
   echo "installing: ${missing[*]}"
