@@ -4,8 +4,6 @@
 # without interleaving, the single reference image).
 #   PROFILE_TOOL PROFILE ROOT LIBRARY_DIR OVO_PROGRAM MESA_PROGRAM FRAMES_TOOL OUTPUT
 #   PROCESS_NAME (optional)  RUN_ARGS  EYE_ARGS (;-lists)  EYE0_COLUMNS (even|odd, or empty)
-#   MASK_STRAY_PIXELS (optional): pixels where Mesa's rasterisation of the mask is known to
-#   leave the column grid; the caller states which and why.
 set(ENV{EGL_PLATFORM} surfaceless)
 file(REMOVE_RECURSE "${OUTPUT}")
 file(MAKE_DIRECTORY "${OUTPUT}" "${ROOT}/sdcard/stereoconv/game")
@@ -45,13 +43,6 @@ endif()
 
 execute_process(COMMAND "${FRAMES_TOOL}" compare "${OUTPUT}/raw.png" "${OUTPUT}/expected.png"
   RESULT_VARIABLE differ OUTPUT_VARIABLE out ERROR_VARIABLE err)
-if(NOT differ EQUAL 0 AND MASK_STRAY_PIXELS)
-  string(REGEX MATCH "differ: ([0-9]+) pixels" counted "${out}")
-  if(counted AND CMAKE_MATCH_1 LESS_EQUAL MASK_STRAY_PIXELS)
-    message(STATUS "${CMAKE_MATCH_1} stray mask pixels, as measured: ${out}")
-    set(differ 0)
-  endif()
-endif()
 if(NOT differ EQUAL 0)
   message(FATAL_ERROR "the stereo frame differs from the expected one (${OUTPUT}):\n${out}${err}")
 endif()
