@@ -47,8 +47,15 @@ if ! dpkg --print-foreign-architectures | grep -qx armhf; then
   $sudo_cmd dpkg --add-architecture armhf
   $sudo_cmd apt-get update -qq || true  # a lagging mirror index is handled below
 fi
+# Exit status 3: this machine cannot be given the toolchain or the emulator (its mirror, or
+# a container without binfmt_misc); the caller decides whether that fails its run.
+unavailable() {
+  echo "armhf: $1; the armhf run did not take place" >&2
+  exit 3
+}
 install_missing crossbuild-essential-armhf qemu-user qemu-user-binfmt \
-  libgtest-dev:armhf libpng-dev:armhf libegl-dev:armhf libgles-dev:armhf
+  libgtest-dev:armhf libpng-dev:armhf libegl-dev:armhf libgles-dev:armhf ||
+  unavailable "the cross toolchain and qemu could not be installed"
 with_mesa=false
 if [ "$mesa_choice" != none ] &&
    install_missing libegl-mesa0:armhf libgl1-mesa-dri:armhf libgles2:armhf libgles1:armhf; then
@@ -60,8 +67,10 @@ fi
 # binaries to qemu-arm. Without systemd nothing registers the handler at boot.
 binfmt=/proc/sys/fs/binfmt_misc
 if [ ! -e "$binfmt/qemu-arm" ]; then
-  mountpoint -q "$binfmt" || $sudo_cmd mount -t binfmt_misc binfmt_misc "$binfmt"
-  grep -v '^#' /usr/lib/binfmt.d/qemu-arm.conf | $sudo_cmd tee "$binfmt/register" >/dev/null
+  mountpoint -q "$binfmt" || $sudo_cmd mount -t binfmt_misc binfmt_misc "$binfmt" ||
+    unavailable "binfmt_misc cannot be mounted here"
+  grep -v '^#' /usr/lib/binfmt.d/qemu-arm.conf | $sudo_cmd tee "$binfmt/register" >/dev/null ||
+    unavailable "qemu-arm cannot be registered with binfmt_misc here"
 fi
 
 cmake -S "$root" -B "$build" -DCMAKE_TOOLCHAIN_FILE="$root/cmake/armhf-toolchain.cmake" \
