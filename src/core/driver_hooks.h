@@ -52,6 +52,17 @@ void* OpenVendorLibrary(int kind);
 // soon as one library cannot be opened; the tables filled before it stay filled.
 bool ResolveDriver();
 
+// Every eglGetDisplay fills the slots again while other threads may be calling through
+// them: relaxed atomic accesses keep that defined, and compile to plain loads and stores.
+template <typename Function>
+inline Function LoadSlot(const Function& slot) {
+    return __atomic_load_n(&slot, __ATOMIC_RELAXED);
+}
+template <typename Function>
+inline void StoreSlot(Function& slot, Function function) {
+    __atomic_store_n(&slot, function, __ATOMIC_RELAXED);
+}
+
 // The calling thread's GL table: its own, or NoContextHooks when it never bound one.
 inline const DriverHooks& CurrentHooks() {
     const void* hooks = pthread_getspecific(g_driver_hooks_key);

@@ -19,7 +19,7 @@ namespace unbound {
 
 #define OVO_EGL_ENTRY(index, result, name, params, args)                           \
     inline result name params {                                                    \
-        auto function = g_vendor_driver.m_egl.name;                                \
+        auto function = LoadSlot(g_vendor_driver.m_egl.name);                      \
         return function != nullptr ? function args : unbound::name args;           \
     }
 #define OVO_EGL_NULL(index, result, name, params, args)

@@ -8,7 +8,7 @@
 namespace ovo::raw {
 
 #define OVO_GL_ENTRY(index, result, name, params, args) \
-    inline result name params { return CurrentHooks().name args; }
+    inline result name params { return LoadSlot(CurrentHooks().name) args; }
 #include "core/gl_entry_table.inc"
 
 }  // namespace ovo::raw

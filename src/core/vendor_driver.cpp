@@ -73,7 +73,8 @@ void* LookupGl(void* library, ProcResolver resolver, const char* name, char* scr
 void FillGlHooks(DriverHooks& hooks, void* library, ProcResolver resolver) {
     char scratch[SCRATCH_NAME_CAPACITY];
 #define OVO_GL_ENTRY(index, result, name, params, args) \
-    hooks.name = FoundOrMissing<decltype(hooks.name)>(LookupGl(library, resolver, #name, scratch));
+    StoreSlot(hooks.name,                               \
+              FoundOrMissing<decltype(hooks.name)>(LookupGl(library, resolver, #name, scratch)));
 #include "core/gl_entry_table.inc"
 }
 
@@ -83,7 +84,7 @@ void FillEglTable(EglDriverTable& table, void* library, ProcResolver resolver) {
         return found != nullptr ? found : Resolve(resolver, name);
     };
 #define OVO_EGL_ENTRY(index, result, name, params, args) \
-    table.name = FoundOrMissing<decltype(table.name)>(lookup(#name));
+    StoreSlot(table.name, FoundOrMissing<decltype(table.name)>(lookup(#name)));
 #define OVO_EGL_SLOT(index, name) OVO_EGL_ENTRY(index, void, name, (), ())
 #include "core/egl_entry_table.inc"
 }
@@ -128,7 +129,7 @@ namespace vendor_egl::unbound {
 #define OVO_EGL_ENTRY(index, result, name, params, args)                       \
     result name params {                                                       \
         ResolveDriver();                                                       \
-        auto function = g_vendor_driver.m_egl.name;                            \
+        auto function = LoadSlot(g_vendor_driver.m_egl.name);                  \
         return function != nullptr ? function args : NoVendorAnswer<result>(); \
     }
 #define OVO_EGL_NULL(index, result, name, params, args)
