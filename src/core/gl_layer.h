@@ -26,6 +26,10 @@ public:
 // The layer of STEREO_MODE_OFF: every call reaches the vendor unchanged.
 class PassThroughLayer : public GlLayer {};
 
+// The layer of threads without a current context, whatever the process's layer is. Never
+// destroyed: such threads may still call while exit handlers run.
+GlLayer& ContextlessLayer();
+
 }  // namespace ovo
 
 #endif

@@ -1,6 +1,7 @@
 #ifndef OVO_ENTRY_GL_DISPATCH_H
 #define OVO_ENTRY_GL_DISPATCH_H
 
+#include "core/driver_hooks.h"
 #include "core/gl_layer.h"
 #include "core/stereo_manager.h"
 #include "present/composition_renderer.h"
@@ -18,8 +19,19 @@ enum StereoParam : GLenum {
     STEREO_PARAM_EYE_ORDER = 0x1004,
 };
 
-// What an exported GL function does once it has the manager: by default, the current
-// layer's operation of the same name with the arguments unchanged.
+// Whether the calling thread has a context current. A thread without one reaches nothing,
+// and must not touch what the rendering thread's captures and stereo layer keep either.
+inline bool ThreadHasContext() { return &CurrentHooks() != &g_vendor_driver.m_no_context_hooks; }
+
+// The layer that serves the calling thread. Without a profile the manager's layer passes
+// every call through and keeps nothing, so only a stereo process pays the thread lookup.
+inline GlLayer& ThreadLayer(StereoManager& manager) {
+    if (!manager.m_profile->m_enabled || ThreadHasContext()) return *manager.m_layer;
+    return ContextlessLayer();
+}
+
+// What an exported GL function does once it has the manager: by default, the calling
+// thread's layer's operation of the same name with the arguments unchanged.
 template <GlEntryIndex INDEX>
 struct GlDispatch;
 
@@ -27,7 +39,7 @@ struct GlDispatch;
     template <>                                                                     \
     struct GlDispatch<GL_ENTRY_##name> {                                            \
         static result Call OVO_PREPEND(StereoManager& manager, params) {           \
-            return manager.m_layer->name OVO_PREPEND(manager, args);                \
+            return ThreadLayer(manager).name OVO_PREPEND(manager, args);            \
         }                                                                           \
     };
 #include "core/gl_entry_table.inc"
@@ -39,16 +51,16 @@ struct GlEntryPoint : GlDispatch<INDEX> {};
 template <>
 struct GlEntryPoint<GL_ENTRY_glViewport> {
     static void Call(StereoManager& manager, GLint x, GLint y, GLsizei width, GLsizei height) {
-        manager.m_viewport = GlRect{x, y, width, height};
-        manager.m_layer->glViewport(manager, x, y, width, height);
+        if (ThreadHasContext()) manager.m_viewport = GlRect{x, y, width, height};
+        ThreadLayer(manager).glViewport(manager, x, y, width, height);
     }
 };
 
 template <>
 struct GlEntryPoint<GL_ENTRY_glScissor> {
     static void Call(StereoManager& manager, GLint x, GLint y, GLsizei width, GLsizei height) {
-        manager.m_scissor = GlRect{x, y, width, height};
-        manager.m_layer->glScissor(manager, x, y, width, height);
+        if (ThreadHasContext()) manager.m_scissor = GlRect{x, y, width, height};
+        ThreadLayer(manager).glScissor(manager, x, y, width, height);
     }
 };
 
@@ -57,15 +69,15 @@ struct GlEntryPoint<GL_ENTRY_glClear> {
     static void Call(StereoManager& manager, GLbitfield mask) {
         // The column-interleave mask lives in the stencil buffer; the game must not wipe it.
         if (manager.m_interleave) mask = CompositionRenderer::FilterClearMask(mask);
-        manager.m_layer->glClear(manager, mask);
+        ThreadLayer(manager).glClear(manager, mask);
     }
 };
 
 template <>
 struct GlEntryPoint<GL_ENTRY_glBindFramebuffer> {
     static void Call(StereoManager& manager, GLenum target, GLuint framebuffer) {
-        manager.m_overlay->SetBoundFramebuffer(framebuffer);
-        manager.m_layer->glBindFramebuffer(manager, target, framebuffer);
+        if (ThreadHasContext()) manager.m_overlay->SetBoundFramebuffer(framebuffer);
+        ThreadLayer(manager).glBindFramebuffer(manager, target, framebuffer);
     }
 };
 
@@ -73,7 +85,7 @@ struct GlEntryPoint<GL_ENTRY_glBindFramebuffer> {
 template <>
 struct GlEntryPoint<GL_ENTRY_glBindFramebufferOES> {
     static void Call(StereoManager& manager, GLenum target, GLuint framebuffer) {
-        manager.m_layer->glBindFramebuffer(manager, target, framebuffer);
+        ThreadLayer(manager).glBindFramebuffer(manager, target, framebuffer);
     }
 };
 
@@ -81,8 +93,8 @@ template <>
 struct GlEntryPoint<GL_ENTRY_glFramebufferTexture2DOES> {
     static void Call(StereoManager& manager, GLenum target, GLenum attachment, GLenum textarget,
                      GLuint texture, GLint level) {
-        manager.m_layer->glFramebufferTexture2D(manager, target, attachment, textarget, texture,
-                                                level);
+        ThreadLayer(manager).glFramebufferTexture2D(manager, target, attachment, textarget,
+                                                    texture, level);
     }
 };
 
@@ -90,7 +102,7 @@ template <>
 struct GlEntryPoint<GL_ENTRY_glRenderbufferStorageOES> {
     static void Call(StereoManager& manager, GLenum target, GLenum internalformat, GLsizei width,
                      GLsizei height) {
-        manager.m_layer->glRenderbufferStorage(manager, target, internalformat, width, height);
+        ThreadLayer(manager).glRenderbufferStorage(manager, target, internalformat, width, height);
     }
 };
 
@@ -102,7 +114,7 @@ struct GlEntryPoint<GL_ENTRY_glGetFloatv> {
             case STEREO_PARAM_EYE_DISTANCE: params[0] = profile.m_eye_distance; return;
             case STEREO_PARAM_EYE_ANGLE: params[0] = profile.m_eye_angle; return;
             case STEREO_PARAM_EYE_SHIFT: params[0] = profile.m_eye_shift; return;
-            default: manager.m_layer->glGetFloatv(manager, pname, params);
+            default: ThreadLayer(manager).glGetFloatv(manager, pname, params);
         }
     }
 };
@@ -114,7 +126,7 @@ struct GlEntryPoint<GL_ENTRY_glGetIntegerv> {
         switch (pname) {
             case STEREO_PARAM_SPLIT: params[0] = static_cast<GLint>(profile.m_split); return;
             case STEREO_PARAM_EYE_ORDER: params[0] = static_cast<GLint>(profile.m_eye_order); return;
-            default: manager.m_layer->glGetIntegerv(manager, pname, params);
+            default: ThreadLayer(manager).glGetIntegerv(manager, pname, params);
         }
     }
 };
@@ -128,7 +140,7 @@ struct GlEntryPoint<GL_ENTRY_glTexParameterf> {
             case STEREO_PARAM_EYE_DISTANCE: profile.m_eye_distance = param; return;
             case STEREO_PARAM_EYE_ANGLE: profile.m_eye_angle = param; return;
             case STEREO_PARAM_EYE_SHIFT: profile.m_eye_shift = param; return;
-            default: manager.m_layer->glTexParameterf(manager, target, pname, param);
+            default: ThreadLayer(manager).glTexParameterf(manager, target, pname, param);
         }
     }
 };
@@ -140,7 +152,7 @@ struct GlEntryPoint<GL_ENTRY_glTexParameteri> {
         switch (target) {
             case STEREO_PARAM_SPLIT: profile.m_split = static_cast<uint32_t>(param); return;
             case STEREO_PARAM_EYE_ORDER: profile.m_eye_order = static_cast<uint32_t>(param); return;
-            default: manager.m_layer->glTexParameteri(manager, target, pname, param);
+            default: ThreadLayer(manager).glTexParameteri(manager, target, pname, param);
         }
     }
 };
