@@ -5,10 +5,10 @@
 // library's own bookkeeping. Every other name the GLES library looks up is found in Mesa's
 // libraries, which this one depends on.
 //
-// eglSwapBuffers flushes the context first, as a device's swap of a window surface does:
-// Mesa's swap of a pbuffer does not, and llvmpipe then holds on to what every frame queued
-// until the context is next flushed (measured with es1_sprites on Mesa directly: 192,588 kB
-// resident at frame 500, 735,480 kB at frame 10,000; with the flush it levels off).
+// eglSwapBuffers first waits for the frame to be drawn, as a device's swap of a window
+// surface flushes and waits for a free buffer. Mesa's swap of a pbuffer does neither:
+// llvmpipe then queues frame after frame, and even with a flush what its scenes in flight
+// hold moves the readings by up to 200 MB (figures in README.md, "Soak").
 //
 // Every COUNT_REPORT_EVERY-th eglSwapBuffers appends one line to the file named by
 // OVO_GL_COUNT:
@@ -110,9 +110,9 @@ extern "C" {
 
 GL_COUNT_EXPORT EGLBoolean EGLAPIENTRY eglSwapBuffers(EGLDisplay display, EGLSurface surface) {
     static const auto mesa = Mesa<decltype(&eglSwapBuffers)>("eglSwapBuffers");
-    static const auto flush = Mesa<decltype(&glFlush)>("glFlush");
+    static const auto finish = Mesa<decltype(&glFinish)>("glFinish");
     static std::atomic<unsigned long> swaps{0};
-    flush();
+    finish();
     const EGLBoolean swapped = mesa(display, surface);
     const unsigned long swap = ++swaps;
     const char* path = std::getenv(COUNT_FILE_VARIABLE);
