@@ -76,9 +76,13 @@ bool StereoProfile::ReadProcessName(char* name) {
     // The last byte is kept for the terminator, so a long name is cut inside the buffer.
     size_t length = 0;
     while (length < PROFILE_PROCESS_NAME_CAPACITY - 1) {
-        const ssize_t got = read(file, name + length, PROFILE_PROCESS_NAME_CAPACITY - 1 - length);
+        const size_t wanted = PROFILE_PROCESS_NAME_CAPACITY - 1 - length;
+        const ssize_t got = read(file, name + length, wanted);
         if (got <= 0) break;
         length += static_cast<size_t>(got);
+        // The kernel gives the whole command line at once; a short read is its end, and
+        // asking again would only cost the draws another system call.
+        if (static_cast<size_t>(got) < wanted) break;
     }
     name[length] = '\0';
     close(file);
