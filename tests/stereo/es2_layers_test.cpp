@@ -8,6 +8,7 @@
 #include "stereo/gl_object_tracker.h"
 #include "stereo/gl_state_guard.h"
 #include "stereo_fixture.h"
+#include "support/scenario_process.h"
 
 namespace {
 
@@ -112,6 +113,36 @@ TEST_F(Es2LayerTest, ADirectDrawIntoTheApplicationsFramebufferIsIssuedOnceUnchan
     m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
     EXPECT_EQ(recorded_calls::RecordedGlCalls(),
               Calls({"glGetIntegerv(0x8CA6, ptr)", "glDrawArrays(4, 0, 3)"}));
+}
+
+// Run as the stock live wallpaper: which separations its two kinds of draws set.
+TEST_F(Es2LayerTest, DISABLED_PrintWallpaperSeparations) {
+    Interleave(true);
+    Profile().m_ramp = ovo::STEREO_RAMP_OFF;  // the wallpaper's preset ramps its separation
+    m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    m_direct.glDrawElements(Manager(), GL_TRIANGLES, 3, GL_UNSIGNED_SHORT, nullptr);
+    for (const std::string& call : Only({"glUniform2f", "glDrawArrays", "glDrawElements"})) {
+        std::printf("draw-log %s\n", call.c_str());
+    }
+}
+
+TEST(Es2WallpaperTest, TheStockWallpapersArrayDrawsAddItsOwnSeparationPerEye) {
+    const ScenarioResult result =
+        RunScenario("com.android.wallpaper", "Es2LayerTest.DISABLED_PrintWallpaperSeparations");
+    EXPECT_EQ(result.m_exit_code, 0);
+    const std::string expected =
+        "draw-log glUniform2f(4, 0.25, 0.5)\ndraw-log glUniform2f(4, 0.1, 0.05)\n"
+        "draw-log glDrawArrays(4, 0, 3)\n"
+        "draw-log glUniform2f(4, -0.25, -0.5)\ndraw-log glUniform2f(4, -0.1, -0.05)\n"
+        "draw-log glDrawArrays(4, 0, 3)\n"
+        "draw-log glUniform2f(4, 0.25, 0.5)\ndraw-log glDrawElements(4, 3, 0x1403, null)\n"
+        "draw-log glUniform2f(4, -0.25, -0.5)\ndraw-log glDrawElements(4, 3, 0x1403, null)\n";
+    std::string logged;
+    for (size_t at = result.m_output.find("draw-log "); at != std::string::npos;
+         at = result.m_output.find("draw-log ", at + 1)) {
+        logged += result.m_output.substr(at, result.m_output.find('\n', at) + 1 - at);
+    }
+    EXPECT_EQ(logged, expected) << result.m_output;
 }
 
 class TrackedLayerTest : public Es2LayerTest {
