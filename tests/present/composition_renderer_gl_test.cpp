@@ -1,21 +1,19 @@
 // The column mask on Mesa, reached through the library: the pixel columns it marks and the
 // application state it leaves alone, in both drawing paths.
-#include <EGL/egl.h>
 #include <GLES/gl.h>
 #include <GLES/glext.h>
 #include <GLES2/gl2.h>
 #include <gtest/gtest.h>
 
 #include <cstdint>
-#include <cstdlib>
 #include <iterator>
-#include <ostream>
 #include <string>
 #include <utility>
 #include <vector>
 
 #include "core/stereo_manager.h"
 #include "present/composition_renderer.h"
+#include "support/mesa_context.h"
 
 namespace {
 
@@ -24,21 +22,7 @@ enum DrawingPath : bool { PATH_GL1 = false, PATH_GL2 = true };
 class CompositionOnMesa : public ::testing::Test {
 protected:
     void Open(DrawingPath path, int32_t width, int32_t height) {
-        setenv("EGL_PLATFORM", "surfaceless", 1);
-        EGLDisplay display = eglGetDisplay(EGL_DEFAULT_DISPLAY);
-        ASSERT_TRUE(eglInitialize(display, nullptr, nullptr));
-        const EGLint renderable = path == PATH_GL2 ? EGL_OPENGL_ES2_BIT : EGL_OPENGL_ES_BIT;
-        const EGLint config_attributes[] = {EGL_SURFACE_TYPE, EGL_PBUFFER_BIT, EGL_RENDERABLE_TYPE,
-                                            renderable, EGL_RED_SIZE, 8, EGL_STENCIL_SIZE, 8,
-                                            EGL_NONE};
-        EGLConfig config;
-        EGLint count = 0;
-        ASSERT_TRUE(eglChooseConfig(display, config_attributes, &config, 1, &count) && count == 1);
-        const EGLint size[] = {EGL_WIDTH, width, EGL_HEIGHT, height, EGL_NONE};
-        EGLSurface surface = eglCreatePbufferSurface(display, config, size);
-        const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, path == PATH_GL2 ? 2 : 1, EGL_NONE};
-        EGLContext context = eglCreateContext(display, config, EGL_NO_CONTEXT, version);
-        ASSERT_TRUE(eglMakeCurrent(display, surface, surface, context));
+        ASSERT_NO_FATAL_FAILURE(MakeMesaContextCurrent(path == PATH_GL2 ? 2 : 1, width, height));
         GLint stencil_bits = 0;
         glGetIntegerv(GL_STENCIL_BITS, &stencil_bits);
         ASSERT_EQ(stencil_bits, 8);
@@ -135,37 +119,21 @@ struct Probe {
     const char* m_label;
 
     std::vector<double> Read() const {
-        std::vector<double> values;
         GLint integers[16] = {};
         GLboolean booleans[4] = {};
         GLfloat floats[16] = {};
         void* pointer = nullptr;
         switch (m_kind) {
-            case INTEGERS:
-                glGetIntegerv(m_name, integers);
-                values.assign(integers, integers + m_count);
-                break;
-            case BOOLEANS:
-                glGetBooleanv(m_name, booleans);
-                values.assign(booleans, booleans + m_count);
-                break;
-            case FLOATS:
-                glGetFloatv(m_name, floats);
-                values.assign(floats, floats + m_count);
-                break;
-            case ENABLED:
-                values.push_back(glIsEnabled(m_name));
-                break;
+            case INTEGERS: glGetIntegerv(m_name, integers); return {integers, integers + m_count};
+            case BOOLEANS: glGetBooleanv(m_name, booleans); return {booleans, booleans + m_count};
+            case FLOATS: glGetFloatv(m_name, floats); return {floats, floats + m_count};
+            case ENABLED: return {static_cast<double>(glIsEnabled(m_name))};
             case POINTER:
                 glGetPointerv(m_name, &pointer);
-                values.push_back(reinterpret_cast<uintptr_t>(pointer));
-                break;
-            case TEX_ENV:
-                glGetTexEnviv(GL_TEXTURE_ENV, m_name, integers);
-                values.push_back(integers[0]);
-                break;
+                return {static_cast<double>(reinterpret_cast<uintptr_t>(pointer))};
+            case TEX_ENV: glGetTexEnviv(GL_TEXTURE_ENV, m_name, integers); return {double(integers[0])};
         }
-        return values;
+        return {};
     }
 };
 
@@ -288,10 +256,6 @@ struct MaskCase {
     int32_t m_height;
     int32_t m_marked_parity;  // the columns x with x % 2 == this hold stencil 0
 };
-
-void PrintTo(const MaskCase& each, std::ostream* out) {
-    *out << each.m_label;
-}
 
 // Measured on llvmpipe: a vertical line exactly on the edge x = 2i between two columns is
 // rasterised into the left one, 2i - 1, and the ES 2.0 path's 2i + 0.001 for unknown sizes

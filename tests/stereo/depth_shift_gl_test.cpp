@@ -1,16 +1,15 @@
 // The depth-shift injection on Mesa, reached through the library: the text the driver ends
 // up holding, and that it still compiles.
-#include <EGL/egl.h>
 #include <GLES2/gl2.h>
 #include <gtest/gtest.h>
 
-#include <cstdlib>
 #include <string>
 #include <vector>
 
 #include "core/gl_layer.h"
 #include "core/stereo_manager.h"
 #include "stereo/es2_stereo_layer.h"
+#include "support/mesa_context.h"
 
 namespace {
 
@@ -22,19 +21,7 @@ const std::string STATEMENT =
 class DepthShiftOnMesa : public ::testing::Test {
 protected:
     static void SetUpTestSuite() {
-        setenv("EGL_PLATFORM", "surfaceless", 1);
-        EGLDisplay display = eglGetDisplay(EGL_DEFAULT_DISPLAY);
-        ASSERT_TRUE(eglInitialize(display, nullptr, nullptr));
-        const EGLint config_attributes[] = {EGL_SURFACE_TYPE, EGL_PBUFFER_BIT,
-                                            EGL_RENDERABLE_TYPE, EGL_OPENGL_ES2_BIT, EGL_NONE};
-        EGLConfig config;
-        EGLint count = 0;
-        ASSERT_TRUE(eglChooseConfig(display, config_attributes, &config, 1, &count) && count == 1);
-        const EGLint size[] = {EGL_WIDTH, 16, EGL_HEIGHT, 16, EGL_NONE};
-        EGLSurface surface = eglCreatePbufferSurface(display, config, size);
-        const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, 2, EGL_NONE};
-        EGLContext context = eglCreateContext(display, config, EGL_NO_CONTEXT, version);
-        ASSERT_TRUE(eglMakeCurrent(display, surface, surface, context));
+        ASSERT_NO_FATAL_FAILURE(MakeMesaContextCurrent(2));
         // No profile here: the injecting layer is put in by hand.
         ovo::StereoManager& manager = ovo::StereoManager::instance();
         delete manager.m_layer;
@@ -59,34 +46,34 @@ protected:
     }
 };
 
-TEST_F(DepthShiftOnMesa, VertexShadersCompileWithTheShiftAtTheEndOfMain) {
+TEST_F(DepthShiftOnMesa, VertexShadersCompileWithTheShiftAtTheEndOfMainFragmentShadersAsWritten) {
+    const char* fragment = "precision mediump float;\nvoid main() { gl_FragColor = vec4(1.0); }\n";
     struct Case {
+        GLenum m_type;
         std::vector<const char*> m_strings;
         std::string m_expected;
     } cases[] = {
         // As the samples write them: a leading newline, the statement before main's brace.
-        {{"\nuniform mat4 u_mvp;\nattribute vec4 a_position;\n",
+        {GL_VERTEX_SHADER,
+         {"\nuniform mat4 u_mvp;\nattribute vec4 a_position;\n",
           "void main() {\n    gl_Position = u_mvp * a_position;\n}\n"},
          "\n" + DECLARATION +
              "uniform mat4 u_mvp;\nattribute vec4 a_position;\nvoid main() {\n    gl_Position "
              "= u_mvp * a_position;\n" + STATEMENT + "}\n"},
         // A leading comment and precision statement; the last return of main takes it.
-        {{"// lit\nprecision highp float;\nattribute vec4 p;\nvoid main() {\n"
+        {GL_VERTEX_SHADER,
+         {"// lit\nprecision highp float;\nattribute vec4 p;\nvoid main() {\n"
           "    gl_Position = p;\n    if (p.x > 0.0) { gl_Position = -p; return; }\n"
           "    gl_Position.y = 1.0;\n    return;\n}\n"},
          "// lit\n" + DECLARATION +
              "precision highp float;\nattribute vec4 p;\nvoid main() {\n    gl_Position = p;\n"
              "    if (p.x > 0.0) { gl_Position = -p; return; }\n    gl_Position.y = 1.0;\n    " +
              STATEMENT + "return;\n}\n"},
+        {GL_FRAGMENT_SHADER, {fragment}, fragment},
     };
     for (const Case& each : cases) {
-        EXPECT_EQ(SetAndCompile(GL_VERTEX_SHADER, each.m_strings), each.m_expected);
+        EXPECT_EQ(SetAndCompile(each.m_type, each.m_strings), each.m_expected);
     }
-}
-
-TEST_F(DepthShiftOnMesa, FragmentShadersStayAsWritten) {
-    const char* source = "precision mediump float;\nvoid main() { gl_FragColor = vec4(1.0); }\n";
-    EXPECT_EQ(SetAndCompile(GL_FRAGMENT_SHADER, {source}), source);
 }
 
 }  // namespace
