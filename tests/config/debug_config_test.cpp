@@ -2,40 +2,24 @@
 
 #include <cstdarg>
 #include <filesystem>
-#include <fstream>
 #include <memory>
 #include <regex>
-#include <sstream>
 #include <string>
 
 #include "config/debug_config.h"
+#include "support/device_files.h"
 
 namespace {
-
-namespace fs = std::filesystem;
 
 const char LOG_PATH[] = "/sdcard/x.log";
 const char FALLBACK_PATH[] = "/data/duoscope/debug.log";
 
-std::string RootPath(const std::string& device_path) { return OVO_TEST_DEVICE_ROOT + device_path; }
-
-void WriteDeviceFile(const std::string& device_path, const std::string& content) {
-    fs::create_directories(fs::path(RootPath(device_path)).parent_path());
-    std::ofstream(RootPath(device_path), std::ios::binary) << content;
-}
-
-std::string ReadDeviceFile(const std::string& device_path) {
-    std::ifstream in(RootPath(device_path), std::ios::binary);
-    std::ostringstream content;
-    content << in.rdbuf();
-    return in ? content.str() : "<missing>";
-}
-
 // Stale logs that a writer must truncate, and no configuration.
 void ResetDeviceFiles(bool fallback_folder = true) {
-    for (const char* folder : {"/sdcard", "/data/duoscope"}) fs::remove_all(RootPath(folder));
-    WriteDeviceFile(LOG_PATH, "old");
-    if (fallback_folder) WriteDeviceFile(FALLBACK_PATH, "old");
+    for (const char* folder : {"/sdcard", "/data/duoscope"})
+        std::filesystem::remove_all(device_files::Path(folder));
+    device_files::Write(LOG_PATH, "old");
+    if (fallback_folder) device_files::Write(FALLBACK_PATH, "old");
 }
 
 std::string Configuration(const std::string& root_attributes, const std::string& enable,
@@ -62,15 +46,15 @@ TEST(DebugConfig, WritesTheLogOnlyWhenSwitchedOn) {
     for (const auto& test : cases) {
         SCOPED_TRACE(test.file);
         ResetDeviceFiles();
-        if (!test.file.empty()) WriteDeviceFile("/sdcard/duoscope/dconfig.xml", test.file);
+        if (!test.file.empty()) device_files::Write("/sdcard/duoscope/dconfig.xml", test.file);
         {
             ovo::DebugConfig config;
             config.Print("%04d : eye_distance(%f)", 7, 1.5);
             config.Print("|%s", "next");
         }
         const std::string lines = "0007 : eye_distance(1.500000)|next";
-        EXPECT_EQ(ReadDeviceFile(LOG_PATH), test.log_path == LOG_PATH ? lines : "old");
-        EXPECT_EQ(ReadDeviceFile(FALLBACK_PATH), test.log_path == FALLBACK_PATH ? lines : "old");
+        EXPECT_EQ(device_files::Read(LOG_PATH), test.log_path == LOG_PATH ? lines : "old");
+        EXPECT_EQ(device_files::Read(FALLBACK_PATH), test.log_path == FALLBACK_PATH ? lines : "old");
     }
 }
 
@@ -106,14 +90,14 @@ TEST(FileDebugLog, WritesToTheFileOrTheFallbackOrNowhere) {
         std::string expected;
         for (size_t i = 0; i < test.opens.size(); ++i) {
             expected += std::string("I/ZVT: stream(") + (test.opens[i] == 'o' ? "ok" : "0x00000000") +
-                        ") = fopen(path=" + RootPath(i == 0 ? test.path : FALLBACK_PATH) + ", attrib=wt)\n\n";
+                        ") = fopen(path=" + device_files::Path(i == 0 ? test.path : FALLBACK_PATH) + ", attrib=wt)\n\n";
         }
         EXPECT_EQ(lines, expected);
         for (VPrint operation : EVERY_VPRINT) Call(*log, operation, 5);
         log->Write("%d");
         log.reset();  // closes the file, which flushes it
-        EXPECT_EQ(ReadDeviceFile(LOG_PATH), test.log) << test.path;
-        EXPECT_EQ(ReadDeviceFile(FALLBACK_PATH), test.fallback) << test.path;
+        EXPECT_EQ(device_files::Read(LOG_PATH), test.log) << test.path;
+        EXPECT_EQ(device_files::Read(FALLBACK_PATH, "<missing>"), test.fallback) << test.path;
     }
 }
 

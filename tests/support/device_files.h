@@ -19,8 +19,9 @@ inline void Write(const std::string& device_path, const std::string& text) {
     std::ofstream(Path(device_path), std::ios::binary) << text;
 }
 
-inline std::string Read(const std::string& device_path) {
+inline std::string Read(const std::string& device_path, const std::string& when_missing = "") {
     std::ifstream file(Path(device_path), std::ios::binary);
+    if (!file) return when_missing;
     std::stringstream text;
     text << file.rdbuf();
     return text.str();
