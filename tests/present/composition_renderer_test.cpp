@@ -5,8 +5,8 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
-#include <ostream>
 #include <string>
+#include <utility>
 #include <vector>
 
 #include "core/stereo_manager.h"
@@ -56,6 +56,22 @@ void ExpectCalls(const std::vector<std::string>& expected) {
     }
 }
 
+// glGetIntegerv answers one value for each name.
+void AnswerEachInteger(std::initializer_list<std::pair<GLenum, GLint>> values) {
+    for (auto [name, value] : values) AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, name, {value});
+}
+
+// Saved values, unlike everything a frame sets, of the state that both paths save.
+void AnswerSharedState() {
+    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_COLOR_WRITEMASK, {0, 1, 0, 1});
+    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_DEPTH_WRITEMASK, {1});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VIEWPORT, {1, 2, 3, 4});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_SCISSOR_BOX, {5, 6, 7, 8});
+    AnswerEachInteger({{GL_ARRAY_BUFFER_BINDING, 10}, {GL_CULL_FACE_MODE, GL_FRONT}, {GL_FRONT_FACE, GL_CW}});
+    for (GLenum on : {GL_BLEND, GL_CULL_FACE}) AnswerResult(ovo::GL_ENTRY_glIsEnabled, on, GL_TRUE);
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, GL_FALSE);
+}
+
 struct Line {
     float m_x0, m_y0, m_x1, m_y1;
 };
@@ -94,10 +110,6 @@ void ExpectLine(const float* line, const Line& expected, const char* which) {
     EXPECT_FLOAT_EQ(line[1], expected.m_y0) << which;
     EXPECT_FLOAT_EQ(line[2], expected.m_x1) << which;
     EXPECT_FLOAT_EQ(line[3], expected.m_y1) << which;
-}
-
-void PrintTo(const LineCase& each, std::ostream* out) {
-    *out << each.m_label;
 }
 
 class MaskLinesTest : public CompositionRendererTest,
@@ -184,35 +196,20 @@ TEST_F(CompositionRendererTest,
 TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
     Start(PATH_GL1, 1280, 720);
     m_renderer.Present(Manager());  // builds the lines
-    // Saved values that differ from everything the frame sets.
-    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_COLOR_WRITEMASK, {0, 1, 0, 1});
-    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_DEPTH_WRITEMASK, {1});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_MATRIX_MODE, {GL_TEXTURE});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_BLEND_SRC, {GL_SRC_ALPHA});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_BLEND_DST, {GL_ONE_MINUS_SRC_ALPHA});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VIEWPORT, {1, 2, 3, 4});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_SCISSOR_BOX, {5, 6, 7, 8});
-    for (GLenum on : {GL_BLEND, GL_TEXTURE_2D, GL_ALPHA_TEST, GL_TEXTURE_COORD_ARRAY,
-                      GL_COLOR_ARRAY, GL_CULL_FACE})
+    AnswerSharedState();
+    AnswerEachInteger({{GL_MATRIX_MODE, GL_TEXTURE}, {GL_BLEND_SRC, GL_SRC_ALPHA},
+                       {GL_BLEND_DST, GL_ONE_MINUS_SRC_ALPHA}, {GL_ALPHA_TEST_FUNC, GL_GREATER},
+                       {GL_TEXTURE_BINDING_2D, 21}, {GL_VERTEX_ARRAY_SIZE, 3}, {GL_VERTEX_ARRAY_TYPE, GL_SHORT},
+                       {GL_VERTEX_ARRAY_STRIDE, 12}, {GL_TEXTURE_COORD_ARRAY_SIZE, 2},
+                       {GL_TEXTURE_COORD_ARRAY_TYPE, GL_FLOAT}, {GL_TEXTURE_COORD_ARRAY_STRIDE, 8}});
+    for (GLenum on : {GL_TEXTURE_2D, GL_ALPHA_TEST, GL_TEXTURE_COORD_ARRAY, GL_COLOR_ARRAY})
         AnswerResult(ovo::GL_ENTRY_glIsEnabled, on, GL_TRUE);
-    for (GLenum off : {GL_DEPTH_TEST, GL_LIGHTING, GL_SCISSOR_TEST, GL_VERTEX_ARRAY})
+    for (GLenum off : {GL_LIGHTING, GL_SCISSOR_TEST, GL_VERTEX_ARRAY})
         AnswerResult(ovo::GL_ENTRY_glIsEnabled, off, GL_FALSE);
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_ALPHA_TEST_FUNC, {GL_GREATER});
     AnswerFloats(ovo::GL_ENTRY_glGetFloatv, GL_ALPHA_TEST_REF, {0.5f});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {21});
     AnswerIntegers(ovo::GL_ENTRY_glGetTexEnviv, GL_TEXTURE_ENV_MODE, {GL_MODULATE});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_ARRAY_BUFFER_BINDING, {10});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CULL_FACE_MODE, {GL_FRONT});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRONT_FACE, {GL_CW});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VERTEX_ARRAY_SIZE, {3});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VERTEX_ARRAY_TYPE, {GL_SHORT});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VERTEX_ARRAY_STRIDE, {12});
     const void* application_vertices = &application_vertices;
-    AnswerBytes(ovo::GL_ENTRY_glGetPointerv, GL_VERTEX_ARRAY_POINTER, &application_vertices,
-                sizeof(void*));
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_COORD_ARRAY_SIZE, {2});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_COORD_ARRAY_TYPE, {GL_FLOAT});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_COORD_ARRAY_STRIDE, {8});
+    AnswerBytes(ovo::GL_ENTRY_glGetPointerv, GL_VERTEX_ARRAY_POINTER, &application_vertices, sizeof(void*));
     SetTargetSize(960, 540);  // the lines stay; viewport and projection follow
     ResetRecorder();
     m_renderer.Present(Manager());
@@ -266,17 +263,8 @@ TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
 
 TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
     Start(PATH_GL2, 1024, 600);  // unknown: drawn as 800 x 480
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CURRENT_PROGRAM, {9});
-    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_COLOR_WRITEMASK, {1, 0, 1, 0});
-    AnswerBooleans(ovo::GL_ENTRY_glGetBooleanv, GL_DEPTH_WRITEMASK, {1});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VIEWPORT, {1, 2, 3, 4});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_SCISSOR_BOX, {5, 6, 7, 8});
-    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_BLEND, GL_TRUE);
-    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, GL_FALSE);
-    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_CULL_FACE, GL_TRUE);
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_ARRAY_BUFFER_BINDING, {10});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CULL_FACE_MODE, {GL_FRONT});
-    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRONT_FACE, {GL_CW});
+    AnswerSharedState();
+    AnswerEachInteger({{GL_CURRENT_PROGRAM, 9}});
     AnswerResult(ovo::GL_ENTRY_glCreateProgram, 0, 7);
     AnswerResult(ovo::GL_ENTRY_glCreateShader, GL_VERTEX_SHADER, 11);
     AnswerResult(ovo::GL_ENTRY_glCreateShader, GL_FRAGMENT_SHADER, 12);
@@ -307,7 +295,7 @@ TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
         // restored
         "glEnable(0x0BE2)", "glDisable(0x0B71)", "glViewport(1, 2, 3, 4)", "glScissor(5, 6, 7, 8)",
         "glBindBuffer(0x8892, 10)", "glEnable(0x0B44)", "glCullFace(0x0404)", "glFrontFace(0x0900)",
-        "glDepthMask(1)", "glColorMask(1, 0, 1, 0)", "glUseProgram(9)",
+        "glDepthMask(1)", "glColorMask(0, 1, 0, 1)", "glUseProgram(9)",
         "glStencilOp(0x1E00, 0x1E00, 0x1E00)", "glDisable(0x0B90)"};
     ExpectCalls(expected);
     // The sources, byte for byte, as the vendor received them.
