@@ -1,6 +1,7 @@
 // The OpenGL ES 2.0 layers on the recording vendor: the exact calls of the shader
 // injection, of each draw path and of the render-texture bookkeeping.
 #include <cstring>
+#include <utility>
 
 #include "stereo/es2_scaled_layer.h"
 #include "stereo/es2_stereo_layer.h"
@@ -12,6 +13,7 @@
 
 namespace {
 
+using namespace recorded_calls;
 using Calls = std::vector<std::string>;
 
 constexpr GLuint PROGRAM = 9;
@@ -22,9 +24,8 @@ protected:
     void SetUp() override {
         StereoFixture::SetUp();
         ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
-        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CURRENT_PROGRAM,
-                                       {static_cast<GLint>(PROGRAM)});
-        recorded_calls::AnswerResult(ovo::GL_ENTRY_glGetUniformLocation, PROGRAM, LOCATION);
+        AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_CURRENT_PROGRAM, {static_cast<GLint>(PROGRAM)});
+        AnswerResult(ovo::GL_ENTRY_glGetUniformLocation, PROGRAM, LOCATION);
         BoundFramebuffer(0);
         Manager().m_objects->m_current_framebuffer = 0;
         Manager().m_objects->m_current_texture = 0;
@@ -32,18 +33,15 @@ protected:
     }
 
     static void BoundFramebuffer(GLint framebuffer) {
-        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING,
-                                       {framebuffer});
+        AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING, {framebuffer});
     }
 
     // The shader's type and source as the driver answers them.
     static void DriverShader(GLenum type, const char* source) {
         const GLint length = static_cast<GLint>(std::strlen(source) + 1);
-        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetShaderiv, GL_SHADER_TYPE,
-                                       {static_cast<GLint>(type)});
-        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetShaderiv, GL_SHADER_SOURCE_LENGTH,
-                                       {length});
-        recorded_calls::AnswerBytes(ovo::GL_ENTRY_glGetShaderSource, length, source, length);
+        AnswerIntegers(ovo::GL_ENTRY_glGetShaderiv, GL_SHADER_TYPE, {static_cast<GLint>(type)});
+        AnswerIntegers(ovo::GL_ENTRY_glGetShaderiv, GL_SHADER_SOURCE_LENGTH, {length});
+        AnswerBytes(ovo::GL_ENTRY_glGetShaderSource, length, source, length);
     }
 
     ovo::Es2StereoLayer m_direct{ovo::LAYER_SUBMODE_DIRECT};
@@ -65,15 +63,14 @@ TEST_F(Es2LayerTest, AVertexShaderIsReadBackAndSetAgainAsOneString) {
     const Calls expected = {"glShaderSource(5, 2, ptr, null)", "glGetShaderiv(5, 0x8B4F, ptr)",
                             "glGetShaderiv(5, 0x8B88, ptr)", "glGetShaderSource(5, 41, ptr, ptr)",
                             "glShaderSource(5, 1, ptr, ptr)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
 TEST_F(Es2LayerTest, FragmentShadersAndShadersWithoutMainKeepTheApplicationsSource) {
     const char* source = "void f() { }";
     DriverShader(GL_FRAGMENT_SHADER, source);
     m_tracked.glShaderSource(Manager(), 6, 1, &source, nullptr);
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(),
-              Calls({"glShaderSource(6, 1, ptr, null)", "glGetShaderiv(6, 0x8B4F, ptr)"}));
+    EXPECT_EQ(RecordedGlCalls(), Calls({"glShaderSource(6, 1, ptr, null)", "glGetShaderiv(6, 0x8B4F, ptr)"}));
 
     DriverShader(GL_VERTEX_SHADER, source);
     ResetRecorder();
@@ -89,7 +86,7 @@ TEST_F(Es2LayerTest, AWindowDrawSetsEachEyesUniformThroughTheMask) {
         "glGetUniformLocation(9, ptr)", "glUniform2f(4, 0.25, 0.5)", "glStencilFunc(0x0202, 1, 1)",
         "glDrawArrays(4, 0, 3)", "glUniform2f(4, -0.25, -0.5)", "glStencilFunc(0x0202, 0, 1)",
         "glDrawArrays(4, 0, 3)", "glDisable(0x0B90)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    EXPECT_EQ(RecordedGlCalls(), expected);
     EXPECT_EQ(Manager().m_program, PROGRAM);
     EXPECT_EQ(Manager().m_depth_shift_location, LOCATION);
 }
@@ -104,15 +101,14 @@ TEST_F(Es2LayerTest, WithoutInterleavingEachEyeDrawsIntoItsHalf) {
         "glDrawElements(4, 6, 0x1403, null)", "glUniform2f(4, -0.25, -0.5)",
         "glViewport(0, 0, 800, 240)", "glScissor(0, 0, 800, 240)",
         "glDrawElements(4, 6, 0x1403, null)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
 TEST_F(Es2LayerTest, ADirectDrawIntoTheApplicationsFramebufferIsIssuedOnceUnchanged) {
     Interleave(true);
     BoundFramebuffer(3);
     m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(),
-              Calls({"glGetIntegerv(0x8CA6, ptr)", "glDrawArrays(4, 0, 3)"}));
+    EXPECT_EQ(RecordedGlCalls(), Calls({"glGetIntegerv(0x8CA6, ptr)", "glDrawArrays(4, 0, 3)"}));
 }
 
 // Run as the stock live wallpaper: which separations its two kinds of draws set.
@@ -162,15 +158,11 @@ TEST_F(TrackedLayerTest, RenderTexturesAndRenderbuffersBecomeTwiceAsWide) {
     MakeRenderTexture();
     m_tracked.glRenderbufferStorage(Manager(), GL_RENDERBUFFER, GL_DEPTH_COMPONENT16, 128, 64);
     const Calls expected = {
-        "glBindTexture(0x0DE1, 5)",
-        "glTexImage2D(0x0DE1, 0, 6408, 128, 64, 0, 0x1908, 0x1401, null)",
-        "glBindFramebuffer(0x8D40, 3)",
-        "glFramebufferTexture2D(0x8D40, 0x8CE0, 0x0DE1, 5, 0)",
-        "glBindTexture(0x0DE1, 5)",
-        "glTexImage2D(0x0DE1, 0, 6408, 256, 64, 0, 0x1908, 0x1401, null)",
-        "glBindTexture(0x0DE1, 5)",
-        "glRenderbufferStorage(0x8D41, 0x81A5, 256, 64)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+        "glBindTexture(0x0DE1, 5)", "glTexImage2D(0x0DE1, 0, 6408, 128, 64, 0, 0x1908, 0x1401, null)",
+        "glBindFramebuffer(0x8D40, 3)", "glFramebufferTexture2D(0x8D40, 0x8CE0, 0x0DE1, 5, 0)",
+        "glBindTexture(0x0DE1, 5)", "glTexImage2D(0x0DE1, 0, 6408, 256, 64, 0, 0x1908, 0x1401, null)",
+        "glBindTexture(0x0DE1, 5)", "glRenderbufferStorage(0x8D41, 0x81A5, 256, 64)"};
+    EXPECT_EQ(RecordedGlCalls(), expected);
     const ovo::FramebufferRecord* framebuffer = Manager().m_objects->FindFramebufferRecord(3);
     ASSERT_NE(framebuffer, nullptr);
     EXPECT_EQ(framebuffer->m_width, 128u);
@@ -199,7 +191,7 @@ TEST_F(TrackedLayerTest, UntrackedNamesAndUnsizedTexturesAreNeverRespecified) {
         ResetRecorder();
         m_tracked.glFramebufferTexture2D(Manager(), GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0,
                                          GL_TEXTURE_2D, each.m_texture, 0);
-        EXPECT_EQ(recorded_calls::RecordedGlCalls().size(), 1u) << each.m_texture;
+        EXPECT_EQ(RecordedGlCalls().size(), 1u) << each.m_texture;
     }
 }
 
@@ -213,18 +205,18 @@ TEST_F(TrackedLayerTest, EachEyeDrawsIntoItsHalfOfTheApplicationsFramebuffer) {
         "glGetIntegerv(0x8B8D, ptr)", "glGetUniformLocation(9, ptr)", "glViewport(0, 0, 128, 64)",
         "glUniform2f(4, 0.25, 0.5)", "glDrawArrays(4, 0, 3)", "glViewport(128, 0, 128, 64)",
         "glUniform2f(4, -0.25, -0.5)", "glDrawArrays(4, 0, 3)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
 TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
     Interleave(true);
     MakeRenderTexture();
     m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 0);
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
-    recorded_calls::AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_BLEND, 1);
-    recorded_calls::AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, 1);
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGenTextures, 1, {21});
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffers, 1, {22});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_BLEND, 1);
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, 1);
+    AnswerIntegers(ovo::GL_ENTRY_glGenTextures, 1, {21});
+    AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffers, 1, {22});
     m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);  // makes the eye textures
     // The vendor gave both the same names; eye 1's texture is told apart here.
     Manager().m_eye_textures->m_eyes[1].m_texture = 31;
@@ -252,8 +244,7 @@ TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
 TEST_F(TrackedLayerTest, ClearsCoverTheDoubleWidth) {
     m_tracked.glClear(Manager(), GL_COLOR_BUFFER_BIT);
     m_direct.glClear(Manager(), GL_DEPTH_BUFFER_BIT);
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(),
-              Calls({"glScissor(0, 0, 1600, 480)", "glClear(0x4000)", "glClear(0x0100)"}));
+    EXPECT_EQ(RecordedGlCalls(), Calls({"glScissor(0, 0, 1600, 480)", "glClear(0x4000)", "glClear(0x0100)"}));
 }
 
 TEST_F(Es2LayerTest, TheScaledLayerScalesWindowDrawsAndClearsOnly) {
@@ -271,32 +262,24 @@ TEST_F(Es2LayerTest, TheScaledLayerScalesWindowDrawsAndClearsOnly) {
                             "glViewport(16, 30, 641, 360)", "glDrawArrays(4, 0, 3)",
                             "glBindFramebuffer(0x8D40, 3)", "glViewport(10, 20, 401, 240)",
                             "glDrawArrays(4, 0, 3)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
 TEST_F(Es2LayerTest, TheStateGuardPutsBackOnlyWhatItSavedAndOnlyOnce) {
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv,
-                                   GL_VERTEX_ATTRIB_ARRAY_ENABLED, {1});
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv,
-                                   GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, {12});
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv, GL_VERTEX_ATTRIB_ARRAY_SIZE,
-                                   {3});
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv, GL_VERTEX_ATTRIB_ARRAY_TYPE,
-                                   {GL_FLOAT});
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv,
-                                   GL_VERTEX_ATTRIB_ARRAY_STRIDE, {24});
-    recorded_calls::AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, 0);
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
+    for (auto [name, value] : {std::pair<GLenum, GLint>{GL_VERTEX_ATTRIB_ARRAY_ENABLED, 1},
+                               {GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, 12}, {GL_VERTEX_ATTRIB_ARRAY_SIZE, 3},
+                               {GL_VERTEX_ATTRIB_ARRAY_TYPE, GL_FLOAT}, {GL_VERTEX_ATTRIB_ARRAY_STRIDE, 24}})
+        AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv, name, {value});
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, 0);
     ovo::GlStateGuard guard;
     guard.Save(ovo::GUARD_TEXTURE | ovo::GUARD_ATTRIBUTE_1 | ovo::GUARD_DEPTH_TEST);
     ResetRecorder();
     guard.Restore();
     guard.Restore();
-    const Calls expected = {"glBindTexture(0x0DE1, 5)", "glEnableVertexAttribArray(1)",
-                            "glBindBuffer(0x8892, 12)",
-                            "glVertexAttribPointer(1, 3, 0x1406, 0, 24, null)",
-                            "glDisable(0x0B71)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    const Calls expected = {"glBindTexture(0x0DE1, 5)", "glEnableVertexAttribArray(1)", "glBindBuffer(0x8892, 12)",
+                            "glVertexAttribPointer(1, 3, 0x1406, 0, 24, null)", "glDisable(0x0B71)"};
+    EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
 }  // namespace

@@ -21,17 +21,20 @@ protected:
 
 TEST_F(FrameParametersTest, TheRampStepsTowardZeroThenKeepsTheRestartValue) {
     struct Case {
+        float m_steps;
+        float m_steps_kept;  // a stepless ramp takes one step
         float m_configured;
-        std::vector<float> m_seen;  // by the draws of textures 1 to 6
+        std::vector<float> m_seen;  // by the draws of textures 1, 2, ...
     } cases[] = {
-        {-0.04f, {-0.04f, -0.03f, -0.02f, -0.01f, 0.004f, 0.004f}},
-        {0.04f, {0.04f, 0.03f, 0.02f, 0.01f, -0.004f, -0.004f}},
-        {0.0f, {0.0f, 0.0f, 0.0f, 0.0f, 0.0f, 0.0f}},
+        {4.0f, 4.0f, -0.04f, {-0.04f, -0.03f, -0.02f, -0.01f, 0.004f, 0.004f}},
+        {4.0f, 4.0f, 0.04f, {0.04f, 0.03f, 0.02f, 0.01f, -0.004f, -0.004f}},
+        {4.0f, 4.0f, 0.0f, {0.0f, 0.0f, 0.0f, 0.0f, 0.0f, 0.0f}},
+        {0.0f, 1.0f, 0.5f, {0.5f, -0.05f}},  // reached zero at once: restarted
     };
-    Profile().m_ramp_steps = 4.0f;
     Profile().m_ramp_restart = 10.0f;
     Profile().m_ramp_param = ovo::STEREO_AXIS_X;
     for (const Case& each : cases) {
+        Profile().m_ramp_steps = each.m_steps;
         Profile().m_eye_distance_set = each.m_configured;
         Profile().m_eye_distance = 123.0f;  // the first step of a frame restores the configured value
         StartFrame();
@@ -44,6 +47,7 @@ TEST_F(FrameParametersTest, TheRampStepsTowardZeroThenKeepsTheRestartValue) {
             ovo::StepRampEs1(Manager());
             EXPECT_NEAR(Profile().m_eye_distance, each.m_seen[texture - 1], 1e-7);
         }
+        EXPECT_EQ(Profile().m_ramp_steps, each.m_steps_kept);
     }
 }
 
@@ -77,19 +81,6 @@ TEST_F(FrameParametersTest, EachFormRampsItsOwnParameter) {
             EXPECT_FLOAT_EQ(values[parameter], expected) << std::hex << each.m_param << " " << parameter;
         }
     }
-}
-
-TEST_F(FrameParametersTest, ASteplessRampTakesOneStep) {
-    Profile().m_ramp_param = ovo::STEREO_AXIS_X;
-    Profile().m_ramp_steps = 0.0f;
-    Profile().m_eye_distance_set = 0.5f;
-    StartFrame();
-    BindTexture(1);
-    ovo::StepRampEs1(Manager());
-    BindTexture(2);
-    ovo::StepRampEs1(Manager());
-    EXPECT_EQ(Profile().m_ramp_steps, 1.0f);
-    EXPECT_FLOAT_EQ(Profile().m_eye_distance, -0.05f) << "reached zero at once: restarted";
 }
 
 TEST_F(FrameParametersTest, SpriteDepthPlanesCycleWithTextureChanges) {

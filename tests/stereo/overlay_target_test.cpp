@@ -6,6 +6,7 @@
 
 namespace {
 
+using namespace recorded_calls;
 using Calls = std::vector<std::string>;
 
 class OverlayTargetTest : public StereoFixture {
@@ -13,7 +14,7 @@ protected:
     void SetUp() override {
         StereoFixture::SetUp();
         Profile().m_eye_target = true;
-        recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
+        AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
     }
 
     ovo::OverlayTarget m_overlay{1280, 720, ovo::OVERLAY_CREATE_OBJECTS};
@@ -27,19 +28,17 @@ Calls Names(const Calls& calls) {
 }
 
 TEST_F(OverlayTargetTest, CreateMakesTheTextureAndFramebufferOnce) {
-    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING_OES, {3});
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING_OES, {3});
     m_overlay.Create();
     m_overlay.Create();
     const Calls expected = {
-        "glBindTexture(0x0DE1, 0xFFFF)",
-        "glTexImage2D(0x0DE1, 0, 6408, 1280, 720, 0, 0x1908, 0x1401, null)",
+        "glBindTexture(0x0DE1, 0xFFFF)", "glTexImage2D(0x0DE1, 0, 6408, 1280, 720, 0, 0x1908, 0x1401, null)",
         "glTexParameterf(0x0DE1, 0x2802, 33071)", "glTexParameterf(0x0DE1, 0x2803, 33071)",
         "glTexParameterf(0x0DE1, 0x2800, 9729)", "glTexParameterf(0x0DE1, 0x2801, 9729)",
         "glBindTexture(0x0DE1, 0)", "glGetIntegerv(0x8CA6, ptr)", "glGenFramebuffersOES(1, ptr)",
-        "glBindFramebufferOES(0x8D40, 7)",
-        "glFramebufferTexture2DOES(0x8D40, 0x8CE0, 0x0DE1, 0xFFFF, 0)",
+        "glBindFramebufferOES(0x8D40, 7)", "glFramebufferTexture2DOES(0x8D40, 0x8CE0, 0x0DE1, 0xFFFF, 0)",
         "glBindFramebufferOES(0x8D40, 3)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    EXPECT_EQ(RecordedGlCalls(), expected);
     EXPECT_EQ(m_overlay.BoundFramebuffer(), 0u);
 }
 
@@ -48,13 +47,12 @@ TEST_F(OverlayTargetTest, ARepeatedReleaseDeletesNothingTwice) {
     ResetRecorder();
     m_overlay.Release();
     m_overlay.Release();
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(),
-              (Calls{"glDeleteTextures(1, ptr)", "glDeleteFramebuffersOES(1, ptr)"}));
+    EXPECT_EQ(RecordedGlCalls(), (Calls{"glDeleteTextures(1, ptr)", "glDeleteFramebuffersOES(1, ptr)"}));
     // Without objects, overlay draws are dropped until a reset makes them again.
     ResetRecorder();
     m_overlay.DrawInto(Manager(), ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 3));
     m_overlay.Create();
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), Calls());
+    EXPECT_EQ(RecordedGlCalls(), Calls());
     m_overlay.Reset();
     m_overlay.Create();
     EXPECT_EQ(m_overlay.Framebuffer(), 7u);
@@ -70,7 +68,7 @@ TEST_F(OverlayTargetTest, ClearKeepsTheBindingTheApplicationBelievesIn) {
                             "glGetFloatv(0x0B73, ptr)", "glClearColor(0, 0, 0, 0)",
                             "glClearDepthf(1)", "glClear(0x4100)", "glClearColor(0, 0, 0, 0)",
                             "glClearDepthf(1)", "glBindFramebufferOES(0x8D40, 5)"};
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), expected);
+    EXPECT_EQ(RecordedGlCalls(), expected);
     EXPECT_EQ(m_overlay.BoundFramebuffer(), 5u);
 }
 
@@ -81,7 +79,7 @@ TEST_F(OverlayTargetTest, FlushComposesPendingContentIntoBothHalvesAndPutsStateB
     ASSERT_TRUE(m_overlay.HasContent());
     ResetRecorder();
     m_overlay.Flush(Manager());
-    const Calls calls = recorded_calls::RecordedGlCalls();
+    const Calls calls = RecordedGlCalls();
     // Unbound, saved (with the colour and depth masks, the cull face set right after each),
     // matrices pushed, texture set up, alpha test saved and set, the quads, the matrices
     // popped, then put back in its own order; then the overlay is emptied.
@@ -125,7 +123,7 @@ TEST_F(OverlayTargetTest, FlushComposesPendingContentIntoBothHalvesAndPutsStateB
     // Nothing pending: a flush only unbinds.
     ResetRecorder();
     m_overlay.Flush(Manager());
-    EXPECT_EQ(recorded_calls::RecordedGlCalls(), Calls());
+    EXPECT_EQ(RecordedGlCalls(), Calls());
 }
 
 TEST(GlObjectTrackerTest, NamesPastTheTablesGetNoRecord) {
