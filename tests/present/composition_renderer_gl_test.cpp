@@ -7,6 +7,7 @@
 
 #include <cstdint>
 #include <iterator>
+#include <ostream>
 #include <string>
 #include <utility>
 #include <vector>
@@ -256,6 +257,9 @@ struct MaskCase {
     int32_t m_height;
     int32_t m_marked_parity;  // the columns x with x % 2 == this hold stencil 0
 };
+
+// Names the case in the test list, which otherwise shows its bytes.
+void PrintTo(const MaskCase& each, std::ostream* out) { *out << each.m_label; }
 
 // Measured on llvmpipe: a vertical line exactly on the edge x = 2i between two columns is
 // rasterised into the left one, 2i - 1, and the ES 2.0 path's 2i + 0.001 for unknown sizes

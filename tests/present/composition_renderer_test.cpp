@@ -5,6 +5,7 @@
 #include <gtest/gtest.h>
 
 #include <algorithm>
+#include <ostream>
 #include <string>
 #include <utility>
 #include <vector>
@@ -73,7 +74,7 @@ void AnswerSharedState() {
 }
 
 struct Line {
-    float m_x0, m_y0, m_x1, m_y1;
+    float m_ends[4];  // x0, y0, x1, y1
 };
 
 struct LineCase {
@@ -87,10 +88,10 @@ struct LineCase {
 };
 
 // Unknown sizes are drawn as 800 x 480.
-constexpr Line GL2_FALLBACK_FIRST = {0.001f, 480, 0.001f, 0};
-constexpr Line GL2_FALLBACK_LAST = {800.001f, 480, 800.001f, 0};
-constexpr Line GL1_FALLBACK_FIRST = {-400, 240, -400, -240};
-constexpr Line GL1_FALLBACK_LAST = {400, 240, 400, -240};
+constexpr Line GL2_FALLBACK_FIRST = {{0.001f, 480, 0.001f, 0}};
+constexpr Line GL2_FALLBACK_LAST = {{800.001f, 480, 800.001f, 0}};
+constexpr Line GL1_FALLBACK_FIRST = {{-400, 240, -400, -240}};
+constexpr Line GL1_FALLBACK_LAST = {{400, 240, 400, -240}};
 
 const LineCase LINE_CASES[] = {
     {"Gl2_1280x720", PATH_GL2, 1280, 720, 641, {0, 0, 0, 720}, {1280, 0, 1280, 720}},
@@ -106,11 +107,11 @@ const LineCase LINE_CASES[] = {
 };
 
 void ExpectLine(const float* line, const Line& expected, const char* which) {
-    EXPECT_FLOAT_EQ(line[0], expected.m_x0) << which;
-    EXPECT_FLOAT_EQ(line[1], expected.m_y0) << which;
-    EXPECT_FLOAT_EQ(line[2], expected.m_x1) << which;
-    EXPECT_FLOAT_EQ(line[3], expected.m_y1) << which;
+    for (int i = 0; i < 4; ++i) EXPECT_FLOAT_EQ(line[i], expected.m_ends[i]) << which << " end " << i;
 }
+
+// Names the case in the test list, which otherwise shows its bytes.
+void PrintTo(const LineCase& each, std::ostream* out) { *out << each.m_label; }
 
 class MaskLinesTest : public CompositionRendererTest,
                       public ::testing::WithParamInterface<LineCase> {};
