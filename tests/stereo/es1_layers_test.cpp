@@ -74,6 +74,22 @@ TEST_F(Es1LayerTest, AFlatDrawIsShiftedInClipSpaceIntoEachHalf) {
     EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
+// The layer acts on the classifier's answer for the corner cases, not on element 11 alone.
+TEST_F(Es1LayerTest, TheProjectionTestLooksAtElementsElevenAndFifteen) {
+    const GLfloat cases[][3] = {{0.0f, 0.0f, 1}, {-1.0f, 1.0f, 1}, {-1.0f, 0.0f, 0}, {0.5f, 2.0f, 0}};  // 11, 15, flat
+    Interleave(true);
+    for (const auto& each : cases) {
+        std::vector<GLfloat> projection = IDENTITY;
+        projection[11] = each[0];
+        projection[15] = each[1];
+        AnswerMatrix(GL_PROJECTION_MATRIX, projection);
+        ResetRecorder();
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        // Flat draws get one translation per eye, perspective ones two.
+        EXPECT_EQ(Only({"glTranslatef"}).size(), each[2] != 0 ? 2u : 4u) << each[0] << ", " << each[1];
+    }
+}
+
 TEST_F(Es1LayerTest, OnlyUnmovedDrawsWithOrdinaryBlendingGoToTheOverlay) {
     struct Case {
         bool m_blend;
