@@ -9,6 +9,10 @@ bash "$root/scripts/fuzz.sh"
 cd "$build"
 ctest -j"$(nproc)" --output-on-failure
 
+# The whole suite once more under AddressSanitizer and UndefinedBehaviorSanitizer, and the
+# tests that start threads under ThreadSanitizer (scripts/sanitize.sh; about 9 minutes).
+bash "$root/scripts/sanitize.sh"
+
 # --- 32-bit ARM (armhf), the device's ABI: the same tests built for it and run under
 # qemu-arm (scripts/armhf.sh; about 18 minutes on 2 cores). On amd64 machines only;
 # OVO_SKIP_ARMHF=1 leaves it out. A failing armhf run fails this script.
