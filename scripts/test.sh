@@ -10,12 +10,12 @@ cd "$build"
 ctest -j"$(nproc)" --output-on-failure
 
 # The whole suite once more under AddressSanitizer and UndefinedBehaviorSanitizer, and the
-# tests that start threads under ThreadSanitizer (scripts/sanitize.sh; about 9 minutes).
+# tests that start threads under ThreadSanitizer (scripts/sanitize.sh).
 bash "$root/scripts/sanitize.sh"
 
 # --- 32-bit ARM (armhf), the device's ABI: the same tests built for it and run under
-# qemu-arm (scripts/armhf.sh; about 18 minutes on 2 cores). On amd64 machines only;
-# OVO_SKIP_ARMHF=1 leaves it out. A failing armhf run fails this script.
+# qemu-arm (scripts/armhf.sh; 3 to 18 minutes on 2 cores, by how busy they are). On amd64
+# machines only; OVO_SKIP_ARMHF=1 leaves it out. A failing armhf run fails this script.
 if [ "$(dpkg --print-architecture)" = amd64 ] && [ "${OVO_SKIP_ARMHF:-0}" != 1 ]; then
   armhf_status=0
   bash "$root/scripts/armhf.sh" || armhf_status=$?
