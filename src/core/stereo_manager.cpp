@@ -10,6 +10,7 @@
 
 #include "config/debug_config.h"
 #include "core/gl_layer.h"
+#include "egl/context_registry.h"
 #include "platform/device_path.h"
 #include "present/composition_renderer.h"
 #include "present/viewer_tracker.h"
@@ -21,6 +22,7 @@
 #include "stereo/eye_texture.h"
 #include "stereo/gl_object_tracker.h"
 #include "stereo/overlay_target.h"
+#include "stereo/shader_source_store.h"
 
 namespace ovo {
 
@@ -78,7 +80,9 @@ StereoManager::StereoManager()
       m_es2_layer_installed(false),
       m_scale_x(1.0f),
       m_scale_y(1.0f),
-      m_interleave(false) {
+      m_interleave(false),
+      m_contexts(nullptr),
+      m_shader_sources(nullptr) {
     ReadProcessName(m_process_name);
     m_profile = new StereoProfile();
     m_overlay = new OverlayTarget(m_profile->m_target_width, m_profile->m_target_height,
@@ -88,6 +92,8 @@ StereoManager::StereoManager()
     const StereoMode mode = m_profile->ResolveMode();
     m_layer = CreateLayerForMode(mode);
     m_objects = new GlObjectTracker();
+    m_contexts = new ContextRegistry();
+    m_shader_sources = new ShaderSourceStore();
     const bool shader_mode = mode == STEREO_MODE_SHADER || mode == STEREO_MODE_SHADER_LISTED;
     if (shader_mode && m_profile->m_valid) {
         m_composer = new CompositionRenderer(0, m_profile->m_swap_eye_mask ? 1 : 0);
@@ -107,6 +113,8 @@ void StereoManager::ReleaseAtExit() {
     m_profile->m_mode = STEREO_MODE_OFF;
     // Its GL objects went with their context; only the record is freed.
     delete m_eye_textures;
+    delete m_shader_sources;
+    // The context registry stays: EGL calls from exit handlers still keep it.
     // Released last: nothing that goes before draws any more.
     delete m_composer;
     LateCallObjects* late = new (g_late_call_storage) LateCallObjects();
@@ -116,6 +124,7 @@ void StereoManager::ReleaseAtExit() {
     m_debug = nullptr;
     m_overlay = &late->m_overlay;
     m_eye_textures = nullptr;
+    m_shader_sources = nullptr;
     m_composer = nullptr;
     m_interleave = false;
     m_es2_layer_installed = false;

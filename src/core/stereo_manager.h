@@ -11,10 +11,12 @@
 namespace ovo {
 
 class CompositionRenderer;
+class ContextRegistry;
 class DebugConfig;
 class GlLayer;
 class GlObjectTracker;
 class OverlayTarget;
+class ShaderSourceStore;
 class ViewerTracker;
 struct EyeTexturePair;
 
@@ -84,6 +86,10 @@ public:
     float m_scale_x;
     float m_scale_y;
     bool m_interleave;
+    // The application's contexts and their share groups (EGL calls).
+    ContextRegistry* m_contexts;
+    // The application's own sources of the vertex shaders the ES 2.0 layer rewrote.
+    ShaderSourceStore* m_shader_sources;
 
 private:
     // Builds the manager once; concurrent first callers wait for it. Out of line, so that

@@ -5,6 +5,8 @@
 #include "core/driver_hooks.h"
 #include "core/raw_egl.h"
 #include "core/stereo_manager.h"
+#include "egl/context_registry.h"
+#include "egl/current_context.h"
 #include "entry/export.h"
 #include "stereo/overlay_target.h"
 
@@ -70,6 +72,7 @@ OVO_EXPORT EGLContext EGLAPIENTRY eglCreateContext(EGLDisplay dpy, EGLConfig con
                                                    const EGLint* attrib_list) {
     EGLContext context = ovo::vendor_egl::eglCreateContext(dpy, config, share_context, attrib_list);
     ovo::StereoManager& manager = ovo::StereoManager::instance();
+    manager.m_contexts->NoteCreated(dpy, context, share_context);
     // The overlay's objects are made again in whatever context is made current next.
     if (manager.m_profile->m_eye_target) manager.m_overlay->Reset();
     if (context == EGL_NO_CONTEXT) return context;
@@ -87,7 +90,10 @@ OVO_EXPORT EGLBoolean EGLAPIENTRY eglMakeCurrent(EGLDisplay dpy, EGLSurface draw
     // The overlay's objects go while the old context is still current.
     if (!has_context && eye_target) manager.m_overlay->Release();
     EGLBoolean result = ovo::vendor_egl::eglMakeCurrent(dpy, draw, read, ctx);
-    if (result == EGL_TRUE) ovo::SelectThreadHooks(has_context);
+    if (result == EGL_TRUE) {
+        ovo::SelectThreadHooks(has_context);
+        ovo::NoteCurrentContext(ctx);
+    }
     // The rest runs even when the vendor refused, as long as a context was named.
     if (!has_context) return result;
     if (eye_target) manager.m_overlay->Create();

@@ -8,6 +8,7 @@
 #include "core/stereo_manager.h"
 #include "stereo/eye_viewport.h"
 #include "stereo/glsl_rewriter.h"
+#include "stereo/shader_source_store.h"
 
 namespace ovo {
 
@@ -18,10 +19,12 @@ constexpr int64_t SOURCE_SLACK = 10;
 
 }  // namespace
 
-void InjectDepthShift(GLuint shader) {
+void InjectDepthShift(GLuint shader, ShaderSourceStore& sources, uint32_t group) {
     GLint type = 0;
     raw::glGetShaderiv(shader, GL_SHADER_TYPE, &type);
     if (type != GL_VERTEX_SHADER) return;
+    // Whatever comes of the rewrite, the source kept before is no longer the one set.
+    sources.Forget(group, shader);
     GLint length = 0;  // with the terminating NUL
     raw::glGetShaderiv(shader, GL_SHADER_SOURCE_LENGTH, &length);
     const int64_t inserted =
@@ -43,6 +46,7 @@ void InjectDepthShift(GLuint shader) {
             const GLchar* strings[1] = {rewritten};
             const GLint lengths[1] = {static_cast<GLint>(std::strlen(rewritten))};
             raw::glShaderSource(shader, 1, strings, lengths);
+            sources.Keep(group, shader, source, length);
         }
         rewriter.Clear();
     }

@@ -1,10 +1,13 @@
 #ifndef OVO_STEREO_DEPTH_SHIFT_H
 #define OVO_STEREO_DEPTH_SHIFT_H
 
+#include <cstdint>
+
 #include "core/gl_api.h"
 
 namespace ovo {
 
+class ShaderSourceStore;
 class StereoManager;
 
 // The uniform that every rewritten vertex shader declares: x is the depth threshold, y
@@ -17,9 +20,10 @@ constexpr char DEPTH_SHIFT_STATEMENT[] =
     "gl_Position.w) - gl_Position.z, 0.0));\n";
 
 // After the application's glShaderSource: a vertex shader's source is read back and set
-// again with the declaration and the statement inserted. A shader in which no place for
-// them is found keeps the application's source.
-void InjectDepthShift(GLuint shader);
+// again with the declaration and the statement inserted, and the application's own
+// source is kept in `sources` under the share group `group`. A shader in which no place
+// for them is found keeps the application's source, and nothing is kept for it.
+void InjectDepthShift(GLuint shader, ShaderSourceStore& sources, uint32_t group);
 
 // The current program and the uniform's location in it (-1 when it has none), looked up
 // at every draw so that nothing goes stale.

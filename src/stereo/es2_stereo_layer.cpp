@@ -4,6 +4,8 @@
 
 #include "core/raw_gl.h"
 #include "core/stereo_manager.h"
+#include "egl/context_registry.h"
+#include "egl/current_context.h"
 #include "stereo/depth_shift.h"
 #include "stereo/double_width_draws.h"
 #include "stereo/draw_call.h"
@@ -11,6 +13,7 @@
 #include "stereo/eye_viewport.h"
 #include "stereo/frame_parameters.h"
 #include "stereo/gl_object_tracker.h"
+#include "stereo/shader_source_store.h"
 
 namespace ovo {
 
@@ -66,6 +69,11 @@ void DrawTracked(StereoManager& manager, const DrawCall& draw) {
     DrawEyeBracket(manager, draw, [&](int eye) { SetUpEye(manager, eye); });
 }
 
+// The share group of the calling thread's context: shader names are per group.
+uint32_t CurrentShareGroup(const StereoManager& manager) {
+    return manager.m_contexts->ShareGroupOf(CurrentContext());
+}
+
 }  // namespace
 
 uint32_t Es2StereoLayer::SubmodeFor(const char* process_name) {
@@ -81,10 +89,40 @@ void Es2StereoLayer::Draw(StereoManager& manager, const DrawCall& draw) {
     }
 }
 
-void Es2StereoLayer::glShaderSource(StereoManager&, GLuint shader, GLsizei count,
+void Es2StereoLayer::glShaderSource(StereoManager& manager, GLuint shader, GLsizei count,
                                     const GLchar* const* string, const GLint* length) {
     raw::glShaderSource(shader, count, string, length);
-    InjectDepthShift(shader);
+    // A call the vendor refused leaves the shader's last source, which may be a rewritten
+    // one already.
+    if (count < 0 || (count > 0 && string == nullptr)) return;
+    for (GLsizei i = 0; i < count; ++i) {
+        if (string[i] == nullptr) return;
+    }
+    InjectDepthShift(shader, *manager.m_shader_sources, CurrentShareGroup(manager));
+}
+
+void Es2StereoLayer::glGetShaderiv(StereoManager& manager, GLuint shader, GLenum pname,
+                                   GLint* params) {
+    if (pname == GL_SHADER_SOURCE_LENGTH && params != nullptr &&
+        manager.m_shader_sources->SourceLength(CurrentShareGroup(manager), shader, params)) {
+        return;
+    }
+    raw::glGetShaderiv(shader, pname, params);
+}
+
+void Es2StereoLayer::glGetShaderSource(StereoManager& manager, GLuint shader, GLsizei bufSize,
+                                       GLsizei* length, GLchar* source) {
+    // A negative size is the vendor's to refuse.
+    if (bufSize >= 0 && manager.m_shader_sources->CopySource(CurrentShareGroup(manager), shader,
+                                                             bufSize, length, source)) {
+        return;
+    }
+    raw::glGetShaderSource(shader, bufSize, length, source);
+}
+
+void Es2StereoLayer::glDeleteShader(StereoManager& manager, GLuint shader) {
+    raw::glDeleteShader(shader);
+    if (shader != 0) manager.m_shader_sources->Forget(CurrentShareGroup(manager), shader);
 }
 
 void Es2StereoLayer::glClear(StereoManager& manager, GLbitfield mask) {

@@ -7,6 +7,7 @@
 #include <vector>
 
 #include "core/gl_layer.h"
+#include "core/raw_gl.h"
 #include "core/stereo_manager.h"
 #include "stereo/es2_stereo_layer.h"
 #include "support/mesa_context.h"
@@ -36,10 +37,11 @@ protected:
         glCompileShader(shader);
         GLint compiled = GL_FALSE;
         glGetShaderiv(shader, GL_COMPILE_STATUS, &compiled);
+        // The vendor's text: through the library the application reads its own source.
         GLint length = 0;
-        glGetShaderiv(shader, GL_SHADER_SOURCE_LENGTH, &length);
+        ovo::raw::glGetShaderiv(shader, GL_SHADER_SOURCE_LENGTH, &length);
         std::string source(static_cast<size_t>(length), '\0');
-        glGetShaderSource(shader, length, nullptr, &source[0]);
+        ovo::raw::glGetShaderSource(shader, length, nullptr, &source[0]);
         glDeleteShader(shader);
         source.resize(source.empty() ? 0 : source.size() - 1);
         return compiled == GL_TRUE ? source : std::string();

@@ -6,24 +6,44 @@
 
 #include <cstdlib>
 
+// A display of Mesa's surfaceless platform, reached through the library, with a config of
+// 8 bits of red and of stencil for `client_version`. Call Open under ASSERT_NO_FATAL_FAILURE.
+struct MesaSession {
+    EGLDisplay m_display = EGL_NO_DISPLAY;
+    EGLConfig m_config = nullptr;
+    EGLint m_client_version = 2;
+
+    void Open(EGLint client_version) {
+        setenv("EGL_PLATFORM", "surfaceless", 1);
+        m_client_version = client_version;
+        m_display = eglGetDisplay(EGL_DEFAULT_DISPLAY);
+        ASSERT_TRUE(eglInitialize(m_display, nullptr, nullptr));
+        const EGLint renderable = client_version == 2 ? EGL_OPENGL_ES2_BIT : EGL_OPENGL_ES_BIT;
+        const EGLint attributes[] = {EGL_SURFACE_TYPE, EGL_PBUFFER_BIT, EGL_RENDERABLE_TYPE,
+                                     renderable, EGL_RED_SIZE, 8, EGL_STENCIL_SIZE, 8, EGL_NONE};
+        EGLint count = 0;
+        ASSERT_TRUE(eglChooseConfig(m_display, attributes, &m_config, 1, &count) && count == 1);
+    }
+
+    EGLSurface CreateSurface(EGLint width, EGLint height) const {
+        const EGLint size[] = {EGL_WIDTH, width, EGL_HEIGHT, height, EGL_NONE};
+        return eglCreatePbufferSurface(m_display, m_config, size);
+    }
+
+    EGLContext CreateContext(EGLContext share = EGL_NO_CONTEXT) const {
+        const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, m_client_version, EGL_NONE};
+        return eglCreateContext(m_display, m_config, share, version);
+    }
+};
+
 // Makes an OpenGL ES context of `client_version` current on a pbuffer of Mesa's surfaceless
 // platform, reached through the library, with 8 bits of red and of stencil. Call it under
 // ASSERT_NO_FATAL_FAILURE.
 inline void MakeMesaContextCurrent(EGLint client_version, EGLint width = 16, EGLint height = 16) {
-    setenv("EGL_PLATFORM", "surfaceless", 1);
-    EGLDisplay display = eglGetDisplay(EGL_DEFAULT_DISPLAY);
-    ASSERT_TRUE(eglInitialize(display, nullptr, nullptr));
-    const EGLint renderable = client_version == 2 ? EGL_OPENGL_ES2_BIT : EGL_OPENGL_ES_BIT;
-    const EGLint attributes[] = {EGL_SURFACE_TYPE, EGL_PBUFFER_BIT, EGL_RENDERABLE_TYPE, renderable,
-                                 EGL_RED_SIZE, 8, EGL_STENCIL_SIZE, 8, EGL_NONE};
-    EGLConfig config;
-    EGLint count = 0;
-    ASSERT_TRUE(eglChooseConfig(display, attributes, &config, 1, &count) && count == 1);
-    const EGLint size[] = {EGL_WIDTH, width, EGL_HEIGHT, height, EGL_NONE};
-    EGLSurface surface = eglCreatePbufferSurface(display, config, size);
-    const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, client_version, EGL_NONE};
-    EGLContext context = eglCreateContext(display, config, EGL_NO_CONTEXT, version);
-    ASSERT_TRUE(eglMakeCurrent(display, surface, surface, context));
+    MesaSession session;
+    ASSERT_NO_FATAL_FAILURE(session.Open(client_version));
+    EGLSurface surface = session.CreateSurface(width, height);
+    ASSERT_TRUE(eglMakeCurrent(session.m_display, surface, surface, session.CreateContext()));
 }
 
 #endif
