@@ -38,12 +38,18 @@ void WriteVersionReport(const StereoManager& manager, uint32_t client_api_index)
     report.Write();
 }
 
-// The surface's size where the profile and the rectangles still have none.
-void CaptureSurfaceSize(StereoManager& manager, EGLDisplay display, EGLSurface draw) {
+// The surface's size where the profile and the rectangles still have none. Without a
+// surface to ask (make-current failed, or made no surface current) the size stays 0, and
+// no query runs: it would put an error of its own where eglGetError must report the
+// application's call.
+void CaptureSurfaceSize(StereoManager& manager, EGLDisplay display, EGLSurface draw,
+                        bool made_current) {
     EGLint width = 0;
     EGLint height = 0;
-    vendor_egl::eglQuerySurface(display, draw, EGL_WIDTH, &width);
-    vendor_egl::eglQuerySurface(display, draw, EGL_HEIGHT, &height);
+    if (made_current && draw != EGL_NO_SURFACE) {
+        vendor_egl::eglQuerySurface(display, draw, EGL_WIDTH, &width);
+        vendor_egl::eglQuerySurface(display, draw, EGL_HEIGHT, &height);
+    }
     StereoProfile& profile = *manager.m_profile;
     if (profile.m_target_width == 0 && profile.m_screen_height == 0) {
         profile.m_target_width = width;
@@ -97,7 +103,7 @@ OVO_EXPORT EGLBoolean EGLAPIENTRY eglMakeCurrent(EGLDisplay dpy, EGLSurface draw
     // The rest runs even when the vendor refused, as long as a context was named.
     if (!has_context) return result;
     if (eye_target) manager.m_overlay->Create();
-    ovo::CaptureSurfaceSize(manager, dpy, draw);
+    ovo::CaptureSurfaceSize(manager, dpy, draw, result == EGL_TRUE);
     return result;
 }
 

@@ -58,14 +58,20 @@ void LookUpDepthShift(StereoManager& manager) {
     GLint program = 0;
     raw::glGetIntegerv(GL_CURRENT_PROGRAM, &program);
     manager.m_program = static_cast<GLuint>(program);
-    manager.m_depth_shift_location = raw::glGetUniformLocation(manager.m_program, DEPTH_SHIFT_UNIFORM);
+    // Program 0 has no uniforms: asking would raise an error the application never caused.
+    manager.m_depth_shift_location =
+        program != 0 ? raw::glGetUniformLocation(manager.m_program, DEPTH_SHIFT_UNIFORM) : -1;
 }
 
 void SetDepthShift(const StereoManager& manager, int eye) {
     const StereoProfile& profile = *manager.m_profile;
     const float sign = EyeSign(eye);
-    raw::glUniform2f(manager.m_depth_shift_location, sign * profile.m_eye_angle,
-                     sign * profile.m_eye_distance);
+    SetDepthShiftValue(manager, sign * profile.m_eye_angle, sign * profile.m_eye_distance);
+}
+
+void SetDepthShiftValue(const StereoManager& manager, float threshold, float gain) {
+    if (manager.m_program == 0) return;
+    raw::glUniform2f(manager.m_depth_shift_location, threshold, gain);
 }
 
 }  // namespace ovo

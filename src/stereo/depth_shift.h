@@ -30,6 +30,9 @@ void InjectDepthShift(GLuint shader, ShaderSourceStore& sources, uint32_t group)
 void LookUpDepthShift(StereoManager& manager);
 // The uniform's value for `eye` in the current program.
 void SetDepthShift(const StereoManager& manager, int eye);
+// The uniform set to (threshold, gain). Without a current program nothing is called: the
+// call would only raise an error that the application's own calls never caused.
+void SetDepthShiftValue(const StereoManager& manager, float threshold, float gain);
 
 }  // namespace ovo
 

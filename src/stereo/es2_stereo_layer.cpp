@@ -48,8 +48,7 @@ void DrawDirect(StereoManager& manager, const DrawCall& draw) {
         SetUpEye(manager, eye);
         if (draw.m_elements || profile.DetectLiveWallpaper() != LIVE_WALLPAPER_ANDROID) return;
         const float sign = EyeSign(eye);
-        raw::glUniform2f(manager.m_depth_shift_location, sign * WALLPAPER_DEPTH_THRESHOLD,
-                         sign * WALLPAPER_DEPTH_GAIN);
+        SetDepthShiftValue(manager, sign * WALLPAPER_DEPTH_THRESHOLD, sign * WALLPAPER_DEPTH_GAIN);
         ApplyEyeViewport(manager, eye, manager.ScaleX(), manager.ScaleY());
     });
 }

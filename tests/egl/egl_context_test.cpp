@@ -125,13 +125,17 @@ TEST_F(EglContextTest, ProfileSizesWinOverTheSurface) {
     profile.m_target_height = 480;
     profile.m_width = 1280;
     profile.m_height = 720;
-    // A refused make-current with a context still takes the sizes.
+    // A refused make-current still takes the scale from the profile, but asks the surface
+    // nothing: the query would replace the vendor's error with its own.
     RecorderGetState()->m_make_current_fails = true;
-    EXPECT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(1)), EGL_FALSE);
+    const EGLContext context = m_egl.CreateContext(1);
+    ResetRecorder();
+    EXPECT_EQ(m_egl.MakeCurrent(context), EGL_FALSE);
     EXPECT_EQ(profile.m_target_width, 800);
     EXPECT_EQ(Manager().ScaleX(), 1.6f);
     EXPECT_EQ(Manager().ScaleY(), 1.5f);
-    EXPECT_EQ(Manager().m_viewport.m_width, 1280);
+    EXPECT_EQ(Manager().m_viewport.m_width, 0);
+    EXPECT_EQ(RecorderGetState()->m_call_count, 1u) << "eglMakeCurrent alone";
 }
 
 TEST_F(EglContextTest, EveryDisplayRequestDeletesTheProfileFile) {
