@@ -45,7 +45,7 @@ void GlStateSnapshot::Save(const GlStateItem* items, size_t count) {
         const GlStateItem& item = items[i];
         // Zeros stand for whatever a query leaves unanswered.
         SavedState& saved = m_saved[m_count++];
-        saved = SavedState{item.m_kind, item.m_name, {0, 0, 0, 0}, 0.0f, nullptr};
+        saved = SavedState{item.m_kind, item.m_name, {0, 0, 0, 0}, {0, 0, 0, 0}, nullptr, {}};
         GLint* values = saved.m_values;
         switch (item.m_kind) {
             case GL_STATE_ENABLE:
@@ -73,7 +73,7 @@ void GlStateSnapshot::Save(const GlStateItem* items, size_t count) {
                 break;
             case GL_STATE_ALPHA_FUNC:
                 raw::glGetIntegerv(GL_ALPHA_TEST_FUNC, values);
-                raw::glGetFloatv(GL_ALPHA_TEST_REF, &saved.m_reference);
+                raw::glGetFloatv(GL_ALPHA_TEST_REF, &saved.m_floats[1]);
                 break;
             case GL_STATE_TEXTURE_BINDING:
                 raw::glGetIntegerv(GL_TEXTURE_BINDING_2D, values);
@@ -99,6 +99,12 @@ void GlStateSnapshot::Save(const GlStateItem* items, size_t count) {
             case GL_STATE_PROGRAM:
                 raw::glGetIntegerv(GL_CURRENT_PROGRAM, values);
                 break;
+            case GL_STATE_VERTEX_ATTRIB:
+                SaveVertexAttribute(item.m_name, saved.m_attribute);
+                break;
+            case GL_STATE_CURRENT_COLOR:
+                raw::glGetFloatv(GL_CURRENT_COLOR, saved.m_floats);
+                break;
         }
         if (item.m_set) SetItem(item);
     }
@@ -110,8 +116,10 @@ void GlStateSnapshot::Set(const GlStateItem* items, size_t count) {
 
 void GlStateSnapshot::SetItem(const GlStateItem& item) {
     const GLint* set = item.m_set_value;
-    Apply(SavedState{item.m_kind, item.m_name, {set[0], set[1], set[2], set[3]},
-                     static_cast<GLfloat>(set[1]), nullptr});
+    SavedState state{item.m_kind, item.m_name, {set[0], set[1], set[2], set[3]}, {}, nullptr,
+                     {set[0], 0, set[1], set[2], GL_FALSE, set[3], nullptr}};
+    for (int i = 0; i < 4; ++i) state.m_floats[i] = static_cast<GLfloat>(set[i]);
+    Apply(state);
 }
 
 void GlStateSnapshot::Restore(const uint8_t* order, size_t count) const {
@@ -150,7 +158,7 @@ void GlStateSnapshot::Apply(const SavedState& state) {
             raw::glBlendFunc(static_cast<GLenum>(values[0]), static_cast<GLenum>(values[1]));
             break;
         case GL_STATE_ALPHA_FUNC:
-            raw::glAlphaFunc(static_cast<GLenum>(values[0]), state.m_reference);
+            raw::glAlphaFunc(static_cast<GLenum>(values[0]), state.m_floats[1]);
             break;
         case GL_STATE_TEXTURE_BINDING:
             raw::glBindTexture(GL_TEXTURE_2D, static_cast<GLuint>(values[0]));
@@ -177,6 +185,13 @@ void GlStateSnapshot::Apply(const SavedState& state) {
             break;
         case GL_STATE_PROGRAM:
             raw::glUseProgram(static_cast<GLuint>(values[0]));
+            break;
+        case GL_STATE_VERTEX_ATTRIB:
+            RestoreVertexAttribute(state.m_name, state.m_attribute);
+            break;
+        case GL_STATE_CURRENT_COLOR:
+            raw::glColor4f(state.m_floats[0], state.m_floats[1], state.m_floats[2],
+                           state.m_floats[3]);
             break;
     }
 }

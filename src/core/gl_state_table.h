@@ -9,6 +9,7 @@
 #include <cstdint>
 
 #include "core/gl_api.h"
+#include "core/vertex_attribute_state.h"
 
 namespace ovo {
 
@@ -34,15 +35,21 @@ enum GlStateKind : uint8_t {
                                // glGetPointerv(GL_VERTEX_ARRAY_POINTER); glVertexPointer
     GL_STATE_TEXCOORD_POINTER, // the same for GL_TEXTURE_COORD_ARRAY_*; glTexCoordPointer
     GL_STATE_PROGRAM,          // glGetIntegerv(GL_CURRENT_PROGRAM); glUseProgram
+    GL_STATE_VERTEX_ATTRIB,    // attribute array m_name: SaveVertexAttribute; put back with
+                               // its buffer bound to GL_ARRAY_BUFFER, so before ARRAY_BUFFER
+    GL_STATE_CURRENT_COLOR,    // glGetFloatv(GL_CURRENT_COLOR); glColor4f
 };
 
 struct GlStateItem {
     GlStateKind m_kind;
-    GLenum m_name;  // the capability or client state of ENABLE / CLIENT_ARRAY
+    GLenum m_name;  // the capability or client state of ENABLE / CLIENT_ARRAY, the index
+                    // of VERTEX_ATTRIB
     bool m_set;     // set to m_set_value right after saving it
     // In the put-back call's argument order: {GL_FALSE x4} for a colour mask, {GL_BACK} for
     // the cull face, {1} to enable, {GL_NOTEQUAL, 0} for the alpha function (the reference
-    // as a whole number), {size, type, stride} for a pointer (set to null).
+    // as a whole number), {size, type, stride} for a pointer (set to null), {enabled, size,
+    // type, stride} for an attribute array (from no buffer, not normalised, at null), the
+    // colour in whole numbers.
     GLint m_set_value[4];
 };
 
@@ -70,8 +77,9 @@ private:
         GlStateKind m_kind;
         GLenum m_name;
         GLint m_values[4];
-        GLfloat m_reference;    // the alpha test reference
+        GLfloat m_floats[4];    // the alpha reference (second) or the colour, as put back
         const void* m_pointer;  // an array pointer
+        VertexAttributeState m_attribute;
     };
 
     static void Apply(const SavedState& state);

@@ -27,6 +27,7 @@ enum CompositionGl2Saved : uint8_t {
     GL2_SAVED_BLEND,
     GL2_SAVED_DEPTH_TEST,
     GL2_SAVED_ARRAY_BUFFER,
+    GL2_SAVED_ATTRIBUTE_0,
     GL2_SAVED_CULL_FACE,
     GL2_SAVED_CULL_FACE_MODE,
     GL2_SAVED_FRONT_FACE,
@@ -42,16 +43,19 @@ constexpr GlStateItem COMPOSITION_GL2_SAVED[] = {
     {GL_STATE_ENABLE, GL_BLEND, false, {}},
     {GL_STATE_ENABLE, GL_DEPTH_TEST, false, {}},
     {GL_STATE_ARRAY_BUFFER, 0, false, {}},
+    {GL_STATE_VERTEX_ATTRIB, 0, false, {}},
     {GL_STATE_ENABLE, GL_CULL_FACE, false, {}},
     {GL_STATE_CULL_FACE_MODE, 0, false, {}},
     {GL_STATE_FRONT_FACE, 0, false, {}},
 };
 static_assert(std::size(COMPOSITION_GL2_SAVED) == GL2_SAVED_COUNT, "one position per item");
 
+// The attribute binds its own buffer to be put back; the application's binding comes after.
 constexpr uint8_t COMPOSITION_GL2_RESTORE_ORDER[] = {
-    GL2_SAVED_BLEND,        GL2_SAVED_DEPTH_TEST, GL2_SAVED_VIEWPORT,       GL2_SAVED_SCISSOR_BOX,
-    GL2_SAVED_ARRAY_BUFFER, GL2_SAVED_CULL_FACE,  GL2_SAVED_CULL_FACE_MODE, GL2_SAVED_FRONT_FACE,
-    GL2_SAVED_DEPTH_MASK,   GL2_SAVED_COLOR_MASK, GL2_SAVED_PROGRAM,
+    GL2_SAVED_BLEND,          GL2_SAVED_DEPTH_TEST,     GL2_SAVED_VIEWPORT,
+    GL2_SAVED_SCISSOR_BOX,    GL2_SAVED_ATTRIBUTE_0,    GL2_SAVED_ARRAY_BUFFER,
+    GL2_SAVED_CULL_FACE,      GL2_SAVED_CULL_FACE_MODE, GL2_SAVED_FRONT_FACE,
+    GL2_SAVED_DEPTH_MASK,     GL2_SAVED_COLOR_MASK,     GL2_SAVED_PROGRAM,
 };
 
 constexpr GlStateItem COMPOSITION_GL2_SET[] = {
@@ -89,7 +93,6 @@ void CompositionRenderer::BuildProgram() {
     raw::glGetProgramiv(m_program, GL_LINK_STATUS, &linked);
 }
 
-// Attribute array 0 stays enabled and pointing at the lines.
 void CompositionRenderer::DrawLinesGl2(GLsizei width, GLsizei height) {
     GlStateSnapshot saved;
     saved.Save(COMPOSITION_GL2_SAVED, std::size(COMPOSITION_GL2_SAVED));

@@ -14,34 +14,6 @@ GLuint IntegerState(GLenum name) {
     return static_cast<GLuint>(value);
 }
 
-void SaveAttribute(GLuint index, GuardedAttribute& attribute) {
-    const struct {
-        GLenum m_name;
-        GLint* m_value;
-    } fields[] = {
-        {GL_VERTEX_ATTRIB_ARRAY_ENABLED, &attribute.m_enabled},
-        {GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, &attribute.m_buffer},
-        {GL_VERTEX_ATTRIB_ARRAY_SIZE, &attribute.m_size},
-        {GL_VERTEX_ATTRIB_ARRAY_TYPE, &attribute.m_type},
-        {GL_VERTEX_ATTRIB_ARRAY_NORMALIZED, &attribute.m_normalized},
-        {GL_VERTEX_ATTRIB_ARRAY_STRIDE, &attribute.m_stride},
-    };
-    for (const auto& field : fields) raw::glGetVertexAttribiv(index, field.m_name, field.m_value);
-    raw::glGetVertexAttribPointerv(index, GL_VERTEX_ATTRIB_ARRAY_POINTER, &attribute.m_pointer);
-}
-
-void RestoreAttribute(GLuint index, const GuardedAttribute& attribute) {
-    if (attribute.m_enabled != 0) {
-        raw::glEnableVertexAttribArray(index);
-    } else {
-        raw::glDisableVertexAttribArray(index);
-    }
-    raw::glBindBuffer(GL_ARRAY_BUFFER, static_cast<GLuint>(attribute.m_buffer));
-    raw::glVertexAttribPointer(index, attribute.m_size, static_cast<GLenum>(attribute.m_type),
-                               attribute.m_normalized != 0 ? GL_TRUE : GL_FALSE,
-                               attribute.m_stride, attribute.m_pointer);
-}
-
 }  // namespace
 
 GlStateGuard::GlStateGuard()
@@ -54,7 +26,7 @@ void GlStateGuard::Save(uint32_t flags) {
     if (flags & GUARD_PROGRAM) m_program = IntegerState(GL_CURRENT_PROGRAM);
     if (flags & GUARD_FRAMEBUFFER) m_framebuffer = IntegerState(GL_FRAMEBUFFER_BINDING);
     for (GLuint index = 0; index < 2; ++index) {
-        if (flags & ATTRIBUTE_FLAGS[index]) SaveAttribute(index, m_attributes[index]);
+        if (flags & ATTRIBUTE_FLAGS[index]) SaveVertexAttribute(index, m_attributes[index]);
     }
     if (flags & GUARD_DEPTH_TEST) m_depth_test = raw::glIsEnabled(GL_DEPTH_TEST) != GL_FALSE;
     m_flags = flags & GUARD_ALL;
@@ -65,7 +37,7 @@ void GlStateGuard::Restore() {
     if (m_flags & GUARD_PROGRAM) raw::glUseProgram(m_program);
     if (m_flags & GUARD_FRAMEBUFFER) raw::glBindFramebuffer(GL_FRAMEBUFFER, m_framebuffer);
     for (GLuint index = 0; index < 2; ++index) {
-        if (m_flags & ATTRIBUTE_FLAGS[index]) RestoreAttribute(index, m_attributes[index]);
+        if (m_flags & ATTRIBUTE_FLAGS[index]) RestoreVertexAttribute(index, m_attributes[index]);
     }
     if (m_flags & GUARD_DEPTH_TEST) {
         if (m_depth_test) {

@@ -4,6 +4,7 @@
 #include <cstdint>
 
 #include "core/gl_api.h"
+#include "core/vertex_attribute_state.h"
 
 namespace ovo {
 
@@ -15,17 +16,6 @@ constexpr uint32_t GUARD_ATTRIBUTE_1 = 8;
 constexpr uint32_t GUARD_DEPTH_TEST = 16;
 constexpr uint32_t GUARD_FRAMEBUFFER = 32;
 constexpr uint32_t GUARD_ALL = 63;
-
-// One vertex attribute array as glGetVertexAttribiv and glGetVertexAttribPointerv give it.
-struct GuardedAttribute {
-    GLint m_enabled;
-    GLint m_buffer;
-    GLint m_size;
-    GLint m_type;
-    GLint m_normalized;
-    GLint m_stride;
-    void* m_pointer;
-};
 
 // The OpenGL ES 2.0 bindings that the library's own drawing disturbs, saved before it and
 // put back after it.
@@ -40,7 +30,7 @@ public:
 
 private:
     uint32_t m_flags;
-    GuardedAttribute m_attributes[2];
+    VertexAttributeState m_attributes[2];
     GLuint m_texture;
     GLuint m_program;
     GLuint m_framebuffer;

@@ -68,6 +68,8 @@ protected:
             glLoadIdentity();
             glDisableClientState(GL_COLOR_ARRAY);
             glDisableClientState(GL_TEXTURE_COORD_ARRAY);
+            glDisableClientState(GL_NORMAL_ARRAY);
+            glDisableClientState(GL_POINT_SIZE_ARRAY_OES);
             glEnableClientState(GL_VERTEX_ARRAY);
             glVertexPointer(2, GL_FLOAT, 0, QUAD);
             glColor4f(1, 0, 0, 1);
@@ -114,7 +116,10 @@ protected:
 
 // One piece of GL state as the application reads it back.
 struct Probe {
-    enum Kind { INTEGERS, BOOLEANS, FLOATS, ENABLED, POINTER, TEX_ENV } m_kind;
+    enum Kind {
+        INTEGERS, BOOLEANS, FLOATS, ENABLED, POINTER, TEX_ENV,
+        ATTRIBUTE, ATTRIBUTE_POINTER  // of attribute 0
+    } m_kind;
     GLenum m_name;
     int m_count;
     const char* m_label;
@@ -129,12 +134,12 @@ struct Probe {
             case BOOLEANS: glGetBooleanv(m_name, booleans); return {booleans, booleans + m_count};
             case FLOATS: glGetFloatv(m_name, floats); return {floats, floats + m_count};
             case ENABLED: return {static_cast<double>(glIsEnabled(m_name))};
-            case POINTER:
-                glGetPointerv(m_name, &pointer);
-                return {static_cast<double>(reinterpret_cast<uintptr_t>(pointer))};
+            case POINTER: glGetPointerv(m_name, &pointer); break;
             case TEX_ENV: glGetTexEnviv(GL_TEXTURE_ENV, m_name, integers); return {double(integers[0])};
+            case ATTRIBUTE: glGetVertexAttribiv(0, m_name, integers); return {double(integers[0])};
+            case ATTRIBUTE_POINTER: glGetVertexAttribPointerv(0, m_name, &pointer); break;
         }
-        return {};
+        return {static_cast<double>(reinterpret_cast<uintptr_t>(pointer))};
     }
 };
 
@@ -155,6 +160,13 @@ const Probe SHARED_PROBES[] = {
 
 const Probe GL2_PROBES[] = {
     {Probe::INTEGERS, GL_CURRENT_PROGRAM, 1, "program"},
+    {Probe::ATTRIBUTE, GL_VERTEX_ATTRIB_ARRAY_ENABLED, 1, "attribute 0 enabled"},
+    {Probe::ATTRIBUTE, GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, 1, "attribute 0 buffer"},
+    {Probe::ATTRIBUTE, GL_VERTEX_ATTRIB_ARRAY_SIZE, 1, "attribute 0 size"},
+    {Probe::ATTRIBUTE, GL_VERTEX_ATTRIB_ARRAY_TYPE, 1, "attribute 0 type"},
+    {Probe::ATTRIBUTE, GL_VERTEX_ATTRIB_ARRAY_NORMALIZED, 1, "attribute 0 normalisation"},
+    {Probe::ATTRIBUTE, GL_VERTEX_ATTRIB_ARRAY_STRIDE, 1, "attribute 0 stride"},
+    {Probe::ATTRIBUTE_POINTER, GL_VERTEX_ATTRIB_ARRAY_POINTER, 1, "attribute 0 pointer"},
 };
 
 const Probe GL1_PROBES[] = {
@@ -172,6 +184,9 @@ const Probe GL1_PROBES[] = {
     {Probe::ENABLED, GL_VERTEX_ARRAY, 1, "vertex array"},
     {Probe::ENABLED, GL_TEXTURE_COORD_ARRAY, 1, "texture coordinate array"},
     {Probe::ENABLED, GL_COLOR_ARRAY, 1, "colour array"},
+    {Probe::ENABLED, GL_NORMAL_ARRAY, 1, "normal array"},
+    {Probe::ENABLED, GL_POINT_SIZE_ARRAY_OES, 1, "point size array"},
+    {Probe::FLOATS, GL_CURRENT_COLOR, 4, "current colour"},
     {Probe::INTEGERS, GL_VERTEX_ARRAY_SIZE, 1, "vertex size"},
     {Probe::INTEGERS, GL_VERTEX_ARRAY_TYPE, 1, "vertex type"},
     {Probe::INTEGERS, GL_VERTEX_ARRAY_STRIDE, 1, "vertex stride"},
@@ -217,6 +232,9 @@ void SetGl1ApplicationState() {
     glDisableClientState(GL_VERTEX_ARRAY);
     glEnableClientState(GL_TEXTURE_COORD_ARRAY);
     glEnableClientState(GL_COLOR_ARRAY);
+    glEnableClientState(GL_NORMAL_ARRAY);
+    glEnableClientState(GL_POINT_SIZE_ARRAY_OES);
+    glColor4f(0.25f, 0.5f, 0.75f, 0.125f);
     glVertexPointer(3, GL_SHORT, 6, VERTICES);
     glTexCoordPointer(2, GL_FLOAT, 8, COORDINATES);
 }
@@ -243,11 +261,72 @@ TEST_F(StateOnMesa, TheGl1PathLeavesTheApplicationsStateAsItWas) {
     ExpectStateKept(GL1_PROBES, std::size(GL1_PROBES));
 }
 
+// Attribute 0 as an application leaves it, unlike the mask's and GL's defaults.
+struct AttributeCase {
+    const char* m_label;
+    bool m_enabled;
+    bool m_from_buffer;  // at offset 8 of a buffer other than the array buffer, or a client array
+    GLint m_size;
+    GLenum m_type;
+    GLsizei m_stride;
+};
+
+const AttributeCase ATTRIBUTE_CASES[] = {
+    {"enabled, from a buffer object", true, true, 3, GL_SHORT, 12},
+    {"disabled, from a client array", false, false, 4, GL_UNSIGNED_BYTE, 8},
+};
+
+void SetAttribute0(const AttributeCase& each) {
+    static const GLubyte CLIENT_ARRAY[64] = {};
+    GLint array_buffer = 0;
+    glGetIntegerv(GL_ARRAY_BUFFER_BINDING, &array_buffer);
+    GLuint buffer = 0;
+    if (each.m_from_buffer) glGenBuffers(1, &buffer);
+    glBindBuffer(GL_ARRAY_BUFFER, buffer);
+    const void* pointer = each.m_from_buffer ? reinterpret_cast<const void*>(8) : CLIENT_ARRAY;
+    glVertexAttribPointer(0, each.m_size, each.m_type, GL_TRUE, each.m_stride, pointer);
+    each.m_enabled ? glEnableVertexAttribArray(0) : glDisableVertexAttribArray(0);
+    glBindBuffer(GL_ARRAY_BUFFER, static_cast<GLuint>(array_buffer));
+}
+
 TEST_F(StateOnMesa, TheGl2PathLeavesTheApplicationsStateAsItWas) {
     Open(PATH_GL2, 64, 32);
-    SetSharedApplicationState();
+    for (const AttributeCase& each : ATTRIBUTE_CASES) {
+        SCOPED_TRACE(each.m_label);
+        SetSharedApplicationState();
+        glUseProgram(FillProgram());
+        SetAttribute0(each);
+        ExpectStateKept(GL2_PROBES, std::size(GL2_PROBES));
+    }
+}
+
+// An application that sets its attribute once, as SDL's testgles2 does, draws the same
+// frame after the swap that drew the mask.
+TEST_F(CompositionOnMesa, AnEs2ProgramThatSetsItsAttributeOnceDrawsAgainAfterTheSwap) {
+    Open(PATH_GL2, 64, 32);
+    ovo::StereoManager& manager = ovo::StereoManager::instance();
+    manager.m_composer = new ovo::CompositionRenderer(0, 1);  // released at exit
+    manager.m_interleave = true;
+    static const GLfloat TRIANGLE[] = {-0.5f, -0.5f, 0.5f, -0.5f, 0.0f, 0.5f};
+    GLuint buffer = 0;
+    glGenBuffers(1, &buffer);
+    glBindBuffer(GL_ARRAY_BUFFER, buffer);
+    glBufferData(GL_ARRAY_BUFFER, sizeof(TRIANGLE), TRIANGLE, GL_STATIC_DRAW);
+    glVertexAttribPointer(0, 2, GL_FLOAT, GL_FALSE, 0, nullptr);
+    glEnableVertexAttribArray(0);
     glUseProgram(FillProgram());
-    ExpectStateKept(GL2_PROBES, std::size(GL2_PROBES));
+    std::vector<GLubyte> frames[2];
+    for (std::vector<GLubyte>& frame : frames) {
+        glClear(GL_COLOR_BUFFER_BIT);
+        glDrawArrays(GL_TRIANGLES, 0, 3);
+        frame.resize(static_cast<size_t>(m_width) * m_height * 4);
+        glReadPixels(0, 0, m_width, m_height, GL_RGBA, GL_UNSIGNED_BYTE, frame.data());
+        ASSERT_TRUE(eglSwapBuffers(eglGetCurrentDisplay(), eglGetCurrentSurface(EGL_DRAW)));
+    }
+    size_t red = 0;
+    for (size_t i = 0; i < frames[0].size(); i += 4) red += frames[0][i] > 127;
+    EXPECT_GT(red, frames[0].size() / 4 / 16) << "the first frame shows the triangle";
+    EXPECT_TRUE(frames[1] == frames[0]) << "the second frame shows it too";
 }
 
 struct MaskCase {

@@ -57,9 +57,10 @@ void ExpectCalls(const std::vector<std::string>& expected) {
     }
 }
 
-// glGetIntegerv answers one value for each name.
-void AnswerEachInteger(std::initializer_list<std::pair<GLenum, GLint>> values) {
-    for (auto [name, value] : values) AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, name, {value});
+// glGetIntegerv (or the query given) answers one value for each name.
+void AnswerEachInteger(std::initializer_list<std::pair<GLenum, GLint>> values,
+                       uint32_t gl_index = ovo::GL_ENTRY_glGetIntegerv) {
+    for (auto [name, value] : values) AnswerIntegers(gl_index, name, {value});
 }
 
 // Saved values, unlike everything a frame sets, of the state that both paths save.
@@ -188,10 +189,15 @@ TEST_F(CompositionRendererTest,
     const float* projection = reinterpret_cast<const float*>(uniform->m_arguments[3]);
     EXPECT_FLOAT_EQ(projection[0], 2.0f / 1280);
     EXPECT_FLOAT_EQ(projection[5], 2.0f / 720);
-    const RecordedCall* pointer =
-        FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glVertexAttribPointer);
-    ASSERT_NE(pointer, nullptr);
-    EXPECT_EQ(pointer->m_arguments[5], ArgumentBits(m_renderer.Vertices()));
+    // Each frame points attribute 0 at the lines, before putting the application's back.
+    const RecorderState& state = *RecorderGetState();
+    int line_pointers = 0;
+    for (uint32_t i = 0; i < state.m_call_count; ++i) {
+        const RecordedCall& call = state.m_calls[i];
+        line_pointers += call.m_index == ovo::GL_ENTRY_glVertexAttribPointer &&
+                         call.m_arguments[5] == ArgumentBits(m_renderer.Vertices());
+    }
+    EXPECT_EQ(line_pointers, 2);
 }
 
 TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
@@ -203,11 +209,13 @@ TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
                        {GL_TEXTURE_BINDING_2D, 21}, {GL_VERTEX_ARRAY_SIZE, 3}, {GL_VERTEX_ARRAY_TYPE, GL_SHORT},
                        {GL_VERTEX_ARRAY_STRIDE, 12}, {GL_TEXTURE_COORD_ARRAY_SIZE, 2},
                        {GL_TEXTURE_COORD_ARRAY_TYPE, GL_FLOAT}, {GL_TEXTURE_COORD_ARRAY_STRIDE, 8}});
-    for (GLenum on : {GL_TEXTURE_2D, GL_ALPHA_TEST, GL_TEXTURE_COORD_ARRAY, GL_COLOR_ARRAY})
+    for (GLenum on :
+         {GL_TEXTURE_2D, GL_ALPHA_TEST, GL_TEXTURE_COORD_ARRAY, GL_COLOR_ARRAY, GL_NORMAL_ARRAY})
         AnswerResult(ovo::GL_ENTRY_glIsEnabled, on, GL_TRUE);
-    for (GLenum off : {GL_LIGHTING, GL_SCISSOR_TEST, GL_VERTEX_ARRAY})
+    for (GLenum off : {GL_LIGHTING, GL_SCISSOR_TEST, GL_VERTEX_ARRAY, GL_POINT_SIZE_ARRAY_OES})
         AnswerResult(ovo::GL_ENTRY_glIsEnabled, off, GL_FALSE);
     AnswerFloats(ovo::GL_ENTRY_glGetFloatv, GL_ALPHA_TEST_REF, {0.5f});
+    AnswerFloats(ovo::GL_ENTRY_glGetFloatv, GL_CURRENT_COLOR, {0.25f, 0.5f, 0.75f, 0.125f});
     AnswerIntegers(ovo::GL_ENTRY_glGetTexEnviv, GL_TEXTURE_ENV_MODE, {GL_MODULATE});
     const void* application_vertices = &application_vertices;
     AnswerBytes(ovo::GL_ENTRY_glGetPointerv, GL_VERTEX_ARRAY_POINTER, &application_vertices, sizeof(void*));
@@ -225,7 +233,8 @@ TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
         "glIsEnabled(0x0BC0)", "glIsEnabled(0x0C11)", "glGetIntegerv(0x0BC1, ptr)",
         "glGetFloatv(0x0BC2, ptr)", "glGetIntegerv(0x8069, ptr)",
         "glGetTexEnviv(0x2300, 0x2200, ptr)", "glGetIntegerv(0x8894, ptr)", "glIsEnabled(0x8078)",
-        "glIsEnabled(0x8074)", "glIsEnabled(0x8076)", "glIsEnabled(0x0B44)",
+        "glIsEnabled(0x8074)", "glIsEnabled(0x8076)", "glIsEnabled(0x8075)", "glIsEnabled(0x8B9C)",
+        "glGetFloatv(0x0B00, ptr)", "glIsEnabled(0x0B44)",
         "glGetIntegerv(0x0B45, ptr)", "glGetIntegerv(0x0B46, ptr)", "glGetIntegerv(0x807A, ptr)",
         "glGetIntegerv(0x807B, ptr)", "glGetIntegerv(0x807C, ptr)", "glGetPointerv(0x808E, ptr)",
         "glGetIntegerv(0x8088, ptr)", "glGetIntegerv(0x8089, ptr)", "glGetIntegerv(0x808A, ptr)",
@@ -249,7 +258,9 @@ TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
         "glViewport(1, 2, 3, 4)", "glScissor(5, 6, 7, 8)", "glBlendFunc(0x0302, 0x0303)",
         "glBindTexture(0x0DE1, 21)", "glTexEnvi(0x2300, 0x2200, 8448)", "glBindBuffer(0x8892, 10)",
         "glEnableClientState(0x8078)", "glDisableClientState(0x8074)",
-        "glEnableClientState(0x8076)", "glEnable(0x0B44)", "glCullFace(0x0404)",
+        "glEnableClientState(0x8076)", "glEnableClientState(0x8075)",
+        "glDisableClientState(0x8B9C)", "glColor4f(0.25, 0.5, 0.75, 0.125)", "glEnable(0x0B44)",
+        "glCullFace(0x0404)",
         "glFrontFace(0x0900)", "glVertexPointer(3, 0x1402, 12, ptr)",
         "glTexCoordPointer(2, 0x1406, 8, null)", "glDepthMask(1)", "glColorMask(0, 1, 0, 1)",
         // the stencil stage back to keeping
@@ -266,6 +277,14 @@ TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
     Start(PATH_GL2, 1024, 600);  // unknown: drawn as 800 x 480
     AnswerSharedState();
     AnswerEachInteger({{GL_CURRENT_PROGRAM, 9}});
+    // The application's attribute 0: off, at offset 8 of buffer 14 (not the array buffer 10).
+    AnswerEachInteger({{GL_VERTEX_ATTRIB_ARRAY_ENABLED, 0}, {GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, 14},
+                       {GL_VERTEX_ATTRIB_ARRAY_SIZE, 3}, {GL_VERTEX_ATTRIB_ARRAY_TYPE, GL_SHORT},
+                       {GL_VERTEX_ATTRIB_ARRAY_NORMALIZED, 1}, {GL_VERTEX_ATTRIB_ARRAY_STRIDE, 12}},
+                      ovo::GL_ENTRY_glGetVertexAttribiv);
+    const void* attribute_offset = reinterpret_cast<const void*>(8);
+    AnswerBytes(ovo::GL_ENTRY_glGetVertexAttribPointerv, GL_VERTEX_ATTRIB_ARRAY_POINTER,
+                &attribute_offset, sizeof(void*));
     AnswerResult(ovo::GL_ENTRY_glCreateProgram, 0, 7);
     AnswerResult(ovo::GL_ENTRY_glCreateShader, GL_VERTEX_SHADER, 11);
     AnswerResult(ovo::GL_ENTRY_glCreateShader, GL_FRAGMENT_SHADER, 12);
@@ -277,7 +296,11 @@ TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
         // saved
         "glGetIntegerv(0x8B8D, ptr)", "glGetBooleanv(0x0C23, ptr)", "glGetBooleanv(0x0B72, ptr)",
         "glGetIntegerv(0x0BA2, ptr)", "glGetIntegerv(0x0C10, ptr)", "glIsEnabled(0x0BE2)",
-        "glIsEnabled(0x0B71)", "glGetIntegerv(0x8894, ptr)", "glIsEnabled(0x0B44)",
+        "glIsEnabled(0x0B71)", "glGetIntegerv(0x8894, ptr)", "glGetVertexAttribiv(0, 0x8622, ptr)",
+        "glGetVertexAttribiv(0, 0x889F, ptr)", "glGetVertexAttribiv(0, 0x8623, ptr)",
+        "glGetVertexAttribiv(0, 0x8625, ptr)", "glGetVertexAttribiv(0, 0x886A, ptr)",
+        "glGetVertexAttribiv(0, 0x8624, ptr)", "glGetVertexAttribPointerv(0, 0x8645, ptr)",
+        "glIsEnabled(0x0B44)",
         "glGetIntegerv(0x0B45, ptr)", "glGetIntegerv(0x0B46, ptr)",
         // set
         "glColorMask(0, 0, 0, 0)", "glDepthMask(0)", "glCullFace(0x0405)", "glFrontFace(0x0901)",
@@ -293,12 +316,19 @@ TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
         "glGetUniformLocation(7, ptr)", "glUniform4f(3, 1, 1, 1, 1)",
         "glEnableVertexAttribArray(0)", "glVertexAttribPointer(0, 2, 0x1406, 0, 0, ptr)",
         "glDrawArrays(1, 0, 802)", "glDeleteShader(11)", "glDeleteShader(12)", "glDeleteProgram(7)",
-        // restored
+        // restored: the attribute's buffer bound to put it back, then the application's
         "glEnable(0x0BE2)", "glDisable(0x0B71)", "glViewport(1, 2, 3, 4)", "glScissor(5, 6, 7, 8)",
-        "glBindBuffer(0x8892, 10)", "glEnable(0x0B44)", "glCullFace(0x0404)", "glFrontFace(0x0900)",
+        "glDisableVertexAttribArray(0)", "glBindBuffer(0x8892, 14)",
+        "glVertexAttribPointer(0, 3, 0x1402, 1, 12, ptr)", "glBindBuffer(0x8892, 10)",
+        "glEnable(0x0B44)", "glCullFace(0x0404)", "glFrontFace(0x0900)",
         "glDepthMask(1)", "glColorMask(0, 1, 0, 1)", "glUseProgram(9)",
         "glStencilOp(0x1E00, 0x1E00, 0x1E00)", "glDisable(0x0B90)"};
     ExpectCalls(expected);
+    const RecordedCall* pointer =
+        FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glVertexAttribPointer);
+    ASSERT_NE(pointer, nullptr);
+    EXPECT_EQ(pointer->m_arguments[5], ArgumentBits(attribute_offset))
+        << "the saved offset is put back";
     // The sources, byte for byte, as the vendor received them.
     const char* const sources[] = {
         "attribute vec4 myVertex;uniform mat4 myPMVMatrix;void main(void){\tgl_Position = "
