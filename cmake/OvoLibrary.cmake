@@ -28,16 +28,35 @@ function(ovo_add_gles_library name kind root)
 endfunction()
 
 # ovo_link_vendor(TARGET ROOT EGL GLES1 GLES2): after TARGET is built, ROOT's vendor folder
-# holds the three given libraries under the first GPU tag.
+# holds the three given libraries under the first GPU tag. A library of this build (a
+# generator expression) is linked; one of the host's is copied under the vendor file name
+# and given that name as its soname, as a device's vendor libraries carry names of their
+# own: a program that opens libGLESv2.so.2 by name after the GLES library has opened the
+# vendor's must find the GLES library, not the vendor's copy under its standard soname.
 function(ovo_link_vendor target root egl gles1 gles2)
   set(dir "${root}/system/vendor/lib/egl")
-  add_custom_command(TARGET ${target} POST_BUILD
-    COMMAND ${CMAKE_COMMAND} -E make_directory "${dir}"
-    COMMAND ${CMAKE_COMMAND} -E create_symlink "${egl}" "${dir}/libEGL_mali.so"
-    COMMAND ${CMAKE_COMMAND} -E create_symlink "${gles1}" "${dir}/libGLESv1_CM_mali.so"
-    COMMAND ${CMAKE_COMMAND} -E create_symlink "${gles2}" "${dir}/libGLESv2_mali.so"
-    VERBATIM)
+  set(commands COMMAND ${CMAKE_COMMAND} -E make_directory "${dir}")
+  foreach(kind IN ITEMS EGL GLESv1_CM GLESv2)
+    if(kind STREQUAL "EGL")
+      set(library "${egl}")
+    elseif(kind STREQUAL "GLESv1_CM")
+      set(library "${gles1}")
+    else()
+      set(library "${gles2}")
+    endif()
+    set(name "lib${kind}_mali.so")
+    if(library MATCHES "^\\$<")
+      list(APPEND commands COMMAND ${CMAKE_COMMAND} -E create_symlink "${library}" "${dir}/${name}")
+    else()
+      list(APPEND commands COMMAND ${CMAKE_COMMAND} -E remove -f "${dir}/${name}"
+        COMMAND ${CMAKE_COMMAND} -E copy "${library}" "${dir}/${name}"
+        COMMAND "${OVO_PATCHELF}" --set-soname "${name}" "${dir}/${name}")
+    endif()
+  endforeach()
+  add_custom_command(TARGET ${target} POST_BUILD ${commands} VERBATIM)
 endfunction()
+
+find_program(OVO_PATCHELF patchelf REQUIRED)
 
 # ovo_link_mesa_vendor(TARGET ROOT): the host's Mesa as the vendor of ROOT.
 function(ovo_link_mesa_vendor target root)

@@ -1,7 +1,7 @@
 #!/usr/bin/env bash
 # Installs what building and testing need on Debian 12, and nothing when it is all there.
 set -euo pipefail
-packages=(g++ cmake make python3 binutils pkg-config libpng-dev
+packages=(g++ cmake make python3 binutils pkg-config libpng-dev patchelf
   libgtest-dev libbenchmark-dev
   libegl-dev libgles-dev libegl-mesa0 libgl1-mesa-dri)
 # Installed for this machine's architecture (or for all): on a machine that also holds

@@ -22,7 +22,7 @@ struct MesaGles {
     decltype(&glReadPixels) m_read_pixels = nullptr;
 
     MesaGles() {
-        void* library = dlopen("libGLESv2.so.2", RTLD_NOW | RTLD_LOCAL);
+        void* library = dlopen(OVO_MESA_GLES2_PATH, RTLD_NOW | RTLD_LOCAL);
         if (library == nullptr) return;
         m_bind_framebuffer = reinterpret_cast<decltype(m_bind_framebuffer)>(dlsym(library, "glBindFramebuffer"));
         m_get_integerv = reinterpret_cast<decltype(m_get_integerv)>(dlsym(library, "glGetIntegerv"));
