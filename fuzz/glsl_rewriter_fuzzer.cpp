@@ -1,8 +1,9 @@
-// Any bytes as a vertex shader's source: the rewrite must write nothing past the room it
-// asks for, leave the buffer alone when it inserts nothing, and otherwise give back the source
-// up to its first NUL with the two strings at exactly the places its trace names, in front
-// of a `return` or a closing brace. The input's last byte picks the strings and the number
-// of places, so that plain shader files remain plain shader files.
+// Any bytes as a vertex shader's source: the leading directives that the injection keeps
+// must end within it, and the rewrite must write nothing past the room it asks for, leave the
+// buffer alone when it inserts nothing, and otherwise give back the source up to its first
+// NUL with the two strings at exactly the places its trace names, in front of a `return` or
+// a closing brace. The input's last byte picks the strings and the number of places, so that
+// plain shader files remain plain shader files.
 #include <sys/mman.h>
 #include <unistd.h>
 
@@ -14,6 +15,7 @@
 #include <cstring>
 #include <vector>
 
+#include "stereo/glsl_directives.h"
 #include "stereo/glsl_rewriter.h"
 
 namespace {
@@ -140,6 +142,12 @@ void CheckSplice(const uint8_t* source, size_t size, const StringPair& strings, 
 extern "C" int LLVMFuzzerTestOneInput(const uint8_t* data, size_t size) {
     static TraceCapture capture;
     if (size > INT32_MAX) return 0;
+    // They end at a line's end, or where the source does.
+    const int32_t kept =
+        ovo::LeadingDirectivesLength(reinterpret_cast<const char*>(data), static_cast<int32_t>(size));
+    Check(kept >= 0 && static_cast<size_t>(kept) <= size);
+    Check(kept == 0 || static_cast<size_t>(kept) == size || data[kept] == 0 ||
+          data[kept - 1] == '\n' || data[kept - 1] == '\r');
     const uint8_t last = size > 0 ? data[size - 1] : 0;
     const int32_t max_points = POINT_COUNTS[(last >> 4) & 3];
     const StringPair& strings = STRING_PAIRS[last >> 6];

@@ -73,8 +73,10 @@ if [ ! -e "$binfmt/qemu-arm" ]; then
     unavailable "qemu-arm cannot be registered with binfmt_misc here"
 fi
 
+# The piglit corpus is fetched once, into the normal build tree.
 cmake -S "$root" -B "$build" -DCMAKE_TOOLCHAIN_FILE="$root/cmake/armhf-toolchain.cmake" \
-  -DCMAKE_BUILD_TYPE=RelWithDebInfo -DOVO_BUILD_BENCHMARKS=OFF >/dev/null
+  -DCMAKE_BUILD_TYPE=RelWithDebInfo -DOVO_BUILD_BENCHMARKS=OFF \
+  -DOVO_PIGLIT_DIR="${OVO_BUILD_DIR:-$root/build}/piglit" >/dev/null
 cmake --build "$build" -j"$(nproc)"
 built=$SECONDS
 

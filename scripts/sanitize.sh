@@ -20,8 +20,10 @@ bash "$root/scripts/install-deps.sh"
 thread_targets=(threads_recording_tests threads_mesa_tests core_tests)
 thread_tests='Threads'
 
+# The piglit corpus is fetched once, into the normal build tree.
 configure() {
-  cmake -S "$root" -B "$1" -DCMAKE_BUILD_TYPE=RelWithDebInfo -DOVO_SANITIZE="$2" "${@:3}" >/dev/null
+  cmake -S "$root" -B "$1" -DCMAKE_BUILD_TYPE=RelWithDebInfo -DOVO_SANITIZE="$2" \
+    -DOVO_PIGLIT_DIR="$build/piglit" "${@:3}" >/dev/null
 }
 
 for kind in "${kinds[@]}"; do

@@ -7,6 +7,7 @@
 #include "core/raw_gl.h"
 #include "core/stereo_manager.h"
 #include "stereo/eye_viewport.h"
+#include "stereo/glsl_directives.h"
 #include "stereo/glsl_rewriter.h"
 #include "stereo/shader_source_store.h"
 
@@ -38,11 +39,16 @@ void InjectDepthShift(GLuint shader, ShaderSourceStore& sources, uint32_t group)
     if (source != nullptr && rewritten != nullptr) {
         GLsizei read = 0;
         raw::glGetShaderSource(shader, length, &read, source);
+        // Nothing but comments may precede #version, and Mesa refuses #extension after a
+        // declaration: those lines stay in front and only the rest is rewritten. The
+        // rewriter's trace gives its positions in that rest.
+        const int32_t kept = LeadingDirectivesLength(source, length);
+        std::memcpy(rewritten, source, static_cast<size_t>(kept));
         GlslRewriter rewriter;
         rewriter.SetPreString(DEPTH_SHIFT_DECLARATION);
         rewriter.SetPostString(DEPTH_SHIFT_STATEMENT);
         // Without an insertion the application's source, set already, stays as it is.
-        if (rewriter.Rewrite(rewritten, source, length, 1) == 1) {
+        if (rewriter.Rewrite(rewritten + kept, source + kept, length - kept, 1) == 1) {
             const GLchar* strings[1] = {rewritten};
             const GLint lengths[1] = {static_cast<GLint>(std::strlen(rewritten))};
             raw::glShaderSource(shader, 1, strings, lengths);

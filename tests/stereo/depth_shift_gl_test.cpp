@@ -1,16 +1,9 @@
 // The depth-shift injection on Mesa, reached through the library: the text the driver ends
 // up holding, and that it still compiles.
-#include <GLES2/gl2.h>
-#include <gtest/gtest.h>
-
 #include <string>
 #include <vector>
 
-#include "core/gl_layer.h"
-#include "core/raw_gl.h"
-#include "core/stereo_manager.h"
-#include "stereo/es2_stereo_layer.h"
-#include "support/mesa_context.h"
+#include "depth_shift_on_mesa.h"
 
 namespace {
 
@@ -19,51 +12,34 @@ const std::string STATEMENT =
     "gl_Position.x = gl_Position.x + (uZpDepthShift.y * min((uZpDepthShift.x * "
     "gl_Position.w) - gl_Position.z, 0.0));\n";
 
-class DepthShiftOnMesa : public ::testing::Test {
-protected:
-    static void SetUpTestSuite() {
-        ASSERT_NO_FATAL_FAILURE(MakeMesaContextCurrent(2));
-        // No profile here: the injecting layer is put in by hand.
-        ovo::StereoManager& manager = ovo::StereoManager::instance();
-        delete manager.m_layer;
-        manager.m_layer = new ovo::Es2StereoLayer(ovo::LAYER_SUBMODE_DIRECT);
-    }
-
-    // The source Mesa holds after the application's glShaderSource; empty when the shader
-    // did not compile.
-    static std::string SetAndCompile(GLenum type, const std::vector<const char*>& strings) {
-        const GLuint shader = glCreateShader(type);
-        glShaderSource(shader, static_cast<GLsizei>(strings.size()), strings.data(), nullptr);
-        glCompileShader(shader);
-        GLint compiled = GL_FALSE;
-        glGetShaderiv(shader, GL_COMPILE_STATUS, &compiled);
-        // The vendor's text: through the library the application reads its own source.
-        GLint length = 0;
-        ovo::raw::glGetShaderiv(shader, GL_SHADER_SOURCE_LENGTH, &length);
-        std::string source(static_cast<size_t>(length), '\0');
-        ovo::raw::glGetShaderSource(shader, length, nullptr, &source[0]);
-        glDeleteShader(shader);
-        source.resize(source.empty() ? 0 : source.size() - 1);
-        return compiled == GL_TRUE ? source : std::string();
-    }
+struct Case {
+    const char* m_name;
+    GLenum m_type;
+    std::vector<const char*> m_strings;
+    std::string m_expected;  // as Mesa holds it
+    bool m_compiles = true;
 };
+
+void ExpectCompiledAs(const std::vector<Case>& cases) {
+    for (const Case& each : cases) {
+        const CompiledShader shader = DepthShiftOnMesa::SetAndCompile(each.m_type, each.m_strings);
+        EXPECT_EQ(shader.m_compiled, each.m_compiles) << each.m_name << ": " << shader.m_log;
+        EXPECT_EQ(shader.m_source, each.m_expected) << each.m_name;
+    }
+}
 
 TEST_F(DepthShiftOnMesa, VertexShadersCompileWithTheShiftAtTheEndOfMainFragmentShadersAsWritten) {
     const char* fragment = "precision mediump float;\nvoid main() { gl_FragColor = vec4(1.0); }\n";
-    struct Case {
-        GLenum m_type;
-        std::vector<const char*> m_strings;
-        std::string m_expected;
-    } cases[] = {
-        // As the samples write them: a leading newline, the statement before main's brace.
-        {GL_VERTEX_SHADER,
+    ExpectCompiledAs({
+        {"as the samples write them: a leading newline, the statement before main's brace",
+         GL_VERTEX_SHADER,
          {"\nuniform mat4 u_mvp;\nattribute vec4 a_position;\n",
           "void main() {\n    gl_Position = u_mvp * a_position;\n}\n"},
          "\n" + DECLARATION +
              "uniform mat4 u_mvp;\nattribute vec4 a_position;\nvoid main() {\n    gl_Position "
              "= u_mvp * a_position;\n" + STATEMENT + "}\n"},
-        // A leading comment and precision statement; the last return of main takes it.
-        {GL_VERTEX_SHADER,
+        {"a leading comment and precision statement; the last return of main takes it",
+         GL_VERTEX_SHADER,
          {"// lit\nprecision highp float;\nattribute vec4 p;\nvoid main() {\n"
           "    gl_Position = p;\n    if (p.x > 0.0) { gl_Position = -p; return; }\n"
           "    gl_Position.y = 1.0;\n    return;\n}\n"},
@@ -71,11 +47,49 @@ TEST_F(DepthShiftOnMesa, VertexShadersCompileWithTheShiftAtTheEndOfMainFragmentS
              "precision highp float;\nattribute vec4 p;\nvoid main() {\n    gl_Position = p;\n"
              "    if (p.x > 0.0) { gl_Position = -p; return; }\n    gl_Position.y = 1.0;\n    " +
              STATEMENT + "return;\n}\n"},
-        {GL_FRAGMENT_SHADER, {fragment}, fragment},
-    };
-    for (const Case& each : cases) {
-        EXPECT_EQ(SetAndCompile(each.m_type, each.m_strings), each.m_expected);
-    }
+        {"a fragment shader", GL_FRAGMENT_SHADER, {fragment}, fragment},
+    });
+}
+
+// Nothing but comments and blanks may come before #version, and Mesa refuses #extension
+// after a declaration: the declaration goes in after the leading #version and #extension
+// lines. (Mesa refuses comments on an #extension line itself.)
+TEST_F(DepthShiftOnMesa, TheDeclarationFollowsTheLeadingVersionAndExtensionLines) {
+    const std::string body = "attribute vec4 p;\nvoid main() {\n    gl_Position = p;\n";
+    const std::string whole_body = body + "}\n";
+    const std::string injected_body = DECLARATION + body + STATEMENT + "}\n";
+    const std::string extension = "#extension GL_OES_standard_derivatives : enable";
+    const std::string commented =
+        "// header\n\n#version 100 // why\n\n/* two\n   lines */\n  # extension "
+        "GL_OES_standard_derivatives : enable\n\t#\textension "
+        "GL_OES_standard_derivatives : enable\n// after\n";
+    ExpectCompiledAs({
+        {"#version first", GL_VERTEX_SHADER, {"#version 100\n", whole_body.c_str()},
+         "#version 100\n" + injected_body},
+        {"comments and blank lines among the directives, blanks around #", GL_VERTEX_SHADER,
+         {commented.c_str(), whole_body.c_str()}, commented + injected_body},
+        {"CRLF line ends", GL_VERTEX_SHADER,
+         {"#version 100\r\n#extension GL_OES_standard_derivatives : enable\r\n"
+          "attribute vec4 p;\r\nvoid main() {\r\n    gl_Position = p;\r\n}\r\n"},
+         "#version 100\r\n" + extension + "\r\n" + DECLARATION +
+             "attribute vec4 p;\r\nvoid main() {\r\n    gl_Position = p;\r\n" + STATEMENT +
+             "}\r\n"},
+        {"CR line ends", GL_VERTEX_SHADER,
+         {"#version 100\r#extension GL_OES_standard_derivatives : enable\r"
+          "attribute vec4 p;\rvoid main() {\r    gl_Position = p;\r}\r"},
+         "#version 100\r" + extension + "\r" + DECLARATION +
+             "attribute vec4 p;\rvoid main() {\r    gl_Position = p;\r" + STATEMENT + "}\r"},
+        {"other directives end the kept lines", GL_VERTEX_SHADER,
+         {"#version 100\n#pragma optimize(on)\n#ifdef GL_ES\nprecision highp float;\n#endif\n"
+          "#define SCALE 1.0\n",
+          "attribute vec4 p;\nvoid main() {\n    gl_Position = p * SCALE;\n}\n"},
+         "#version 100\n" + DECLARATION +
+             "#pragma optimize(on)\n#ifdef GL_ES\nprecision highp float;\n#endif\n#define SCALE 1.0\nattribute vec4 "
+             "p;\nvoid main() {\n    gl_Position = p * SCALE;\n" + STATEMENT + "}\n"},
+        // Left as written, which Mesa refuses for want of a declaration.
+        {"directives only, the last without a line end", GL_VERTEX_SHADER,
+         {"#version 100\n", extension.c_str()}, "#version 100\n" + extension, false},
+    });
 }
 
 }  // namespace

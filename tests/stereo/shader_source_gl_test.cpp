@@ -103,6 +103,7 @@ TEST_F(ShaderSourceOnMesa, TheApplicationReadsBackItsOwnStringsAsTheVendorJoinsT
          {"// made of pieces\nattribute vec4 p;\nvoid ", "main() { gl_Position = p; }\nIGNORED", "// end\n"},
          {-1, 28, -1}},
         {"a NUL inside the given length", {with_nul}, {static_cast<GLint>(sizeof(with_nul) - 1)}},
+        {"a leading version directive", {"#version 100\n", body}, {}},
     };
     for (const Case& each : cases) {
         SCOPED_TRACE(each.m_label);

@@ -1,0 +1,46 @@
+#!/usr/bin/env bash
+# Puts the vertex shaders that the depth-shift corpus test compiles below DIR (the build
+# tree's piglit/ unless configured otherwise): Debian's piglit package is fetched once with
+# `apt-get download` (about 34 MB, kept in DIR) and only the GLSL ES 1.00 tests and the
+# other .vert files are taken out of it, never the 2 GB the package installs.
+#   scripts/fetch-piglit-corpus.sh DIR
+# Does nothing when DIR already holds the extract. Fails, saying why, when the package
+# cannot be had; the corpus test then fails too.
+set -euo pipefail
+dir="${1:?usage: fetch-piglit-corpus.sh DIR}"
+stamp="$dir/extracted"
+[ -e "$stamp" ] && exit 0
+
+fail() {
+  echo "fetch-piglit-corpus: $*" >&2
+  echo "fetch-piglit-corpus: the piglit corpus test cannot run without it and fails" >&2
+  exit 1
+}
+
+mkdir -p "$dir"
+partial=""
+extract=""
+trap 'rm -rf "$partial" "$extract"' EXIT
+debs=("$dir"/piglit_*.deb)
+if [ ! -e "${debs[0]}" ]; then
+  echo "fetch-piglit-corpus: fetching the piglit package (about 34 MB) into $dir"
+  # Fetched beside the cache and moved in whole, so that an interrupted download is not
+  # taken for the package next time.
+  partial="$(mktemp -d "$dir/download.XXXXXX")"
+  (cd "$partial" && apt-get download piglit) ||
+    fail "'apt-get download piglit' failed (no network, or apt knows no piglit package: run 'apt-get update' as root, or bash scripts/install-deps.sh)"
+  mv "$partial"/piglit_*.deb "$dir/"
+  debs=("$dir"/piglit_*.deb)
+fi
+
+extract="$(mktemp -d "$dir/extract.XXXXXX")"
+dpkg-deb --fsys-tarfile "${debs[0]}" |
+  tar -x -C "$extract" --wildcards './usr/lib/*/piglit/tests/spec/glsl-es-1.00/*' \
+    './usr/lib/*/piglit/tests/spec/*.vert' ||
+  fail "could not extract the shaders from ${debs[0]} (delete it to fetch it again)"
+tests=("$extract"/usr/lib/*/piglit/tests)
+[ -d "${tests[0]}/spec/glsl-es-1.00" ] || fail "${debs[0]} holds no tests/spec/glsl-es-1.00"
+rm -rf "$dir/tests"
+mv "${tests[0]}" "$dir/tests"
+touch "$stamp"
+echo "fetch-piglit-corpus: extracted $(find "$dir/tests" -type f | wc -l) files into $dir/tests"
