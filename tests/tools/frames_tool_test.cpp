@@ -1,5 +1,6 @@
-// ovo-frames run as a program: a frame through the command line and PNG files, and bad
-// input answered with the file's name, a non-zero exit and no output file.
+// ovo-frames run as a program: a frame through the command line and PNG files, the depth of
+// a made stereo frame, and bad input answered with the file's name, a non-zero exit and no
+// output file.
 #include <sys/wait.h>
 #include <unistd.h>
 
@@ -8,12 +9,14 @@
 #include <cstdlib>
 #include <filesystem>
 #include <fstream>
+#include <map>
 #include <sstream>
 #include <string>
 #include <vector>
 
 #include "common/png_writer.h"
 #include "png_reader.h"
+#include "stereo_scene.h"
 
 namespace {
 
@@ -72,6 +75,15 @@ protected:
         return {WIFEXITED(status) ? WEXITSTATUS(status) : -1, output};
     }
 
+    // Every file name that starts with "out" in the folder; the tool must leave none behind.
+    std::vector<std::string> Outputs() const {
+        std::vector<std::string> names;
+        for (const fs::directory_entry& entry : fs::directory_iterator(m_folder)) {
+            if (entry.path().filename().string().find("out") != std::string::npos) names.push_back(entry.path().string());
+        }
+        return names;
+    }
+
     const fs::path m_folder = fs::path(testing::TempDir()) / ("ovo-frames-" + std::to_string(getpid()));
 };
 
@@ -106,7 +118,7 @@ TEST_F(FramesToolTest, CompareDescribesTheDifference) {
     EXPECT_EQ(Run({"compare", "eye.png", "wide.png"}).first, 1);
 }
 
-TEST_F(FramesToolTest, BadInputNamesTheFileAndLeavesNoOutput) {
+TEST_F(FramesToolTest, BadInputNamesTheFileOrOptionAndLeavesNoOutput) {
     const struct {
         std::vector<std::string> m_arguments;
         const char* m_message;
@@ -120,17 +132,118 @@ TEST_F(FramesToolTest, BadInputNamesTheFileAndLeavesNoOutput) {
         {{"preview", "eye.png", "--eye0-columns", "left"}, "ovo-frames: --eye0-columns: 'left' is neither"},
         {{"preview", "eye.png", "--eye0-columns", "odd", "--tolerance", "1"}, "ovo-frames: --tolerance: unknown option"},
         {{"preview", "eye.png", "eye.png", "--eye0-columns", "odd"}, "ovo-frames: preview: takes one image"},
+        {{"disparity", "missing.png", "--eye0-columns", "odd"}, "ovo-frames: missing.png: No such file"},
+        {{"disparity", "text.png", "--eye0-columns", "odd"}, "ovo-frames: text.png: not a PNG file"},
+        {{"disparity", "odd.png", "--eye0-columns", "even"}, "ovo-frames: odd.png: width 3 is odd"},
+        {{"disparity", "eye.png"}, "ovo-frames: disparity: needs --eye0-columns even|odd"},
+        {{"disparity", "eye.png", "--eye0-columns", "even", "--block", "1"}, "ovo-frames: --block: '1' is not a whole number from 2"},
+        {{"disparity", "eye.png", "--eye0-columns", "even", "--max-shift", "0"}, "ovo-frames: --max-shift: '0' is not"},
+        {{"disparity", "eye.png", "--eye0-columns", "even", "--budget-far", "-1"}, "ovo-frames: --budget-far: '-1' is not a percentage"},
+        {{"disparity", "eye.png", "--eye0-columns", "even", "--tolerance", "1"}, "ovo-frames: --tolerance: unknown option"},
+        {{"disparity", "eye.png", "--eye0-columns", "even", "--map", "no-folder/out.png"}, "ovo-frames: no-folder/out.png: cannot write"},
+        {{"match-eyes", "eye.png", "wide.png", "--eye0-columns", "odd"}, "ovo-frames: wide.png: 6x2, but eye.png is 4x2"},
+        {{"match-eyes", "eye.png", "--eye0-columns", "odd"}, "ovo-frames: match-eyes: takes two images"},
     };
     for (const auto& test : cases) {
         std::vector<std::string> arguments = test.m_arguments;
-        arguments.insert(arguments.end(), {"-o", "out.png"});
-        SCOPED_TRACE(arguments[0] + " " + arguments[1]);
+        const std::string command = arguments[0];
+        if (command == "disparity" && arguments.back() != "no-folder/out.png") arguments.insert(arguments.end(), {"--map", "out.png"});
+        if (command != "disparity" && command != "match-eyes") arguments.insert(arguments.end(), {"-o", "out.png"});
+        SCOPED_TRACE(arguments[0] + " " + arguments[1] + " " + arguments.back());
         const std::pair<int, std::string> result = Run(arguments);
         EXPECT_EQ(result.first, 2);
         EXPECT_EQ(result.second.rfind(test.m_message, 0), 0u) << result.second;
-        for (const fs::directory_entry& entry : fs::directory_iterator(m_folder)) {
-            EXPECT_EQ(entry.path().filename().string().find("out.png"), std::string::npos) << entry.path();
-        }
+        EXPECT_EQ(Outputs(), std::vector<std::string>());
+    }
+}
+
+// The "name = value" lines of the tool's output.
+std::map<std::string, std::string> Values(const std::string& output) {
+    std::map<std::string, std::string> values;
+    std::istringstream lines(output);
+    std::string line;
+    while (std::getline(lines, line)) {
+        const size_t equals = line.find(" = ");
+        if (equals != std::string::npos) values[line.substr(0, equals)] = line.substr(equals + 3);
+    }
+    return values;
+}
+
+float Number(const std::map<std::string, std::string>& values, const std::string& name) {
+    const auto found = values.find(name);
+    return found == values.end() ? -1000.0f : std::stof(found->second);
+}
+
+// 160 x 48 eye pixels: a block row 4 pixels behind the screen, one 2 in front, one flat.
+const std::vector<ovo_test::Stripe> SCENE = {{16, 4.0f}, {16, -2.0f}, {16, 0.0f, ovo_test::STRIPE_FLAT}};
+constexpr int32_t SCENE_EYE_WIDTH = 160;
+
+TEST_F(FramesToolTest, DisparityPrintsTheRangeHistogramAndBudgetWarnings) {
+    Save("scene.png", ovo_test::InterleaveEyes(ovo_test::MakeEyes(SCENE_EYE_WIDTH, SCENE), ovo_frames::COLUMN_PARITY_ODD));
+    // 2 pixels of 160 are 1.25 % of the width, 4 are 2.5 %.
+    const struct {
+        std::vector<std::string> m_options;
+        float m_nearest;
+        float m_farthest;
+        bool m_too_near;
+        bool m_too_far;
+    } cases[] = {
+        {{"--eye0-columns", "odd"}, -2.0f, 4.0f, true, true},
+        {{"--eye0-columns", "odd", "--budget-near", "1.5", "--budget-far=3"}, -2.0f, 4.0f, false, false},
+        // The wrong parity swaps the eyes, and so the sign.
+        {{"--eye0-columns", "even", "--budget-near", "3", "--budget-far", "1.2"}, -4.0f, 2.0f, false, true},
+    };
+    for (const auto& test : cases) {
+        SCOPED_TRACE(test.m_options[1]);
+        std::vector<std::string> arguments = {"disparity", "scene.png", "--map", "out.png"};
+        arguments.insert(arguments.end(), test.m_options.begin(), test.m_options.end());
+        const std::pair<int, std::string> result = Run(arguments);
+        ASSERT_EQ(result.first, 0) << result.second;
+        const std::map<std::string, std::string> values = Values(result.second);
+        EXPECT_NEAR(Number(values, "nearest_px"), test.m_nearest, 0.1f) << result.second;
+        EXPECT_NEAR(Number(values, "farthest_px"), test.m_farthest, 0.1f);
+        EXPECT_NEAR(Number(values, "nearest_percent"), test.m_nearest * 100.0f / SCENE_EYE_WIDTH, 0.07f);
+        EXPECT_NEAR(Number(values, "farthest_percent"), test.m_farthest * 100.0f / SCENE_EYE_WIDTH, 0.07f);
+        EXPECT_EQ(values.at("blocks_known"), "20");
+        EXPECT_EQ(values.at("blocks_unknown"), "10");
+        char bin[32];
+        std::snprintf(bin, sizeof(bin), "histogram[%+d]", static_cast<int>(test.m_farthest));
+        EXPECT_EQ(values.at(bin).substr(0, 3), "10 ") << bin;
+        EXPECT_EQ(result.second.find("warning = nearest") != std::string::npos, test.m_too_near);
+        EXPECT_EQ(result.second.find("warning = farthest") != std::string::npos, test.m_too_far);
+        ovo_frames::RgbaFrame map;
+        std::string problem;
+        ASSERT_TRUE(ovo_frames::ReadPng(In("out.png").c_str(), &map, &problem)) << problem;
+        EXPECT_EQ(map.m_width, 2 * SCENE_EYE_WIDTH);
+        EXPECT_EQ(map.m_height, 48);
+    }
+}
+
+TEST_F(FramesToolTest, DisparityOfAFlatFrameIsUnknownWithExit1) {
+    Save("flat.png", ovo_test::InterleaveEyes(ovo_test::MakeEyes(32, {{32, 1.0f, ovo_test::STRIPE_FLAT}}), ovo_frames::COLUMN_PARITY_EVEN));
+    const std::pair<int, std::string> result = Run({"disparity", "flat.png", "--eye0-columns", "even"});
+    EXPECT_EQ(result.first, 1);
+    const std::map<std::string, std::string> values = Values(result.second);
+    EXPECT_EQ(values.at("blocks_known"), "0");
+    EXPECT_EQ(values.at("nearest_px"), "unknown");
+    EXPECT_EQ(values.count("warning"), 0u);
+}
+
+TEST_F(FramesToolTest, MatchEyesFindsEachEyeHalfTheDisparityFromTheFlatFrame) {
+    Save("scene.png", ovo_test::InterleaveEyes(ovo_test::MakeEyes(SCENE_EYE_WIDTH, SCENE), ovo_frames::COLUMN_PARITY_EVEN));
+    std::vector<ovo_test::Stripe> flat = SCENE;
+    for (ovo_test::Stripe& stripe : flat) stripe.m_disparity = 0.0f;
+    Save("native.png", ovo_test::InterleaveEyes(ovo_test::MakeEyes(SCENE_EYE_WIDTH, flat), ovo_frames::COLUMN_PARITY_EVEN));
+    const std::pair<int, std::string> result = Run({"match-eyes", "scene.png", "native.png", "--eye0-columns", "even"});
+    ASSERT_EQ(result.first, 0) << result.second;
+    const std::map<std::string, std::string> values = Values(result.second);
+    EXPECT_NEAR(Number(values, "eye0.nearest_px"), -2.0f, 0.1f) << result.second;
+    EXPECT_NEAR(Number(values, "eye0.farthest_px"), 1.0f, 0.1f);
+    EXPECT_NEAR(Number(values, "eye1.nearest_px"), -1.0f, 0.1f);
+    EXPECT_NEAR(Number(values, "eye1.farthest_px"), 2.0f, 0.1f);
+    for (const char* eye : {"eye0.", "eye1."}) {
+        EXPECT_NEAR(Number(values, std::string(eye) + "unknown_fraction"), 1.0f / 3.0f, 0.001f);
+        EXPECT_LT(Number(values, std::string(eye) + "residual_worst"), 1.0f);
     }
 }
 

@@ -33,6 +33,18 @@ RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity 
     return out;
 }
 
+RgbaFrame ColumnsOf(const RgbaFrame& frame, ColumnParity parity) {
+    RgbaFrame out(frame.m_width / 2, frame.m_height);
+    for (int32_t y = 0; y < out.m_height; ++y) {
+        for (int32_t x = 0; x < out.m_width; ++x) std::memcpy(out.At(x, y), frame.At(2 * x + parity, y), FRAME_PIXEL_BYTES);
+    }
+    return out;
+}
+
+EyeImages Deinterleave(const RgbaFrame& raw, ColumnParity eye0_columns) {
+    return {ColumnsOf(raw, eye0_columns), ColumnsOf(raw, Other(eye0_columns))};
+}
+
 RgbaFrame Preview(const RgbaFrame& raw, ColumnParity eye0_columns) {
     RgbaFrame out(raw.m_width * 2, raw.m_height);
     for (int32_t y = 0; y < raw.m_height; ++y) {

@@ -16,6 +16,18 @@ enum ColumnParity : int32_t {
 // the others. Both eyes have the same size.
 RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity eye0_columns);
 
+// The columns of one parity of `frame` (even width), side by side: (W / 2) x H. Of an
+// interleaved frame that is one eye's image in its own pixels ("eye pixels").
+RgbaFrame ColumnsOf(const RgbaFrame& frame, ColumnParity parity);
+
+struct EyeImages {
+    RgbaFrame m_eye0;
+    RgbaFrame m_eye1;
+};
+
+// Both eyes' images of an interleaved frame `raw` (even width), each (W / 2) x H.
+EyeImages Deinterleave(const RgbaFrame& raw, ColumnParity eye0_columns);
+
 // The two eyes of an interleaved frame `raw` (even width) next to each other, eye 0 on the
 // left, each at full width: an eye's column fills itself and its neighbour of the other
 // eye. 2W x H, so the preview keeps the aspect.
