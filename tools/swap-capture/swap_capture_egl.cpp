@@ -6,6 +6,8 @@
 //   OVO_SWAP_CAPTURE_STOP  N: frames after the N-th swap are not captured, and once that
 //                          swap is done the process is sent SIGTERM, so that a program
 //                          that runs until it is told to stop ends at a fixed frame
+// After each swap it moves a frame clock on (ovo_frame_clock_advance), where one was
+// preloaded into the program.
 // It is loaded as the vendor's EGL under the GLES library, or as a program's own EGL to
 // capture its frames on Mesa directly; either way it reaches Mesa by its full path, never
 // by a name that the library under test may stand in for.
@@ -117,6 +119,10 @@ struct Around<ovo::EGL_ENTRY_eglSwapBuffers> {
         if (count.m_stop == 0 || count.m_swaps <= count.m_stop) CaptureSwap(display, surface, count.m_swaps);
     }
     static void After(EGLDisplay, EGLSurface) {
+        // A clock preloaded into the program that moves one frame per swap.
+        using Advance = void (*)();
+        static const Advance advance_clock = reinterpret_cast<Advance>(dlsym(RTLD_DEFAULT, "ovo_frame_clock_advance"));
+        if (advance_clock != nullptr) advance_clock();
         const SwapCount& count = Swaps();
         if (count.m_stop != 0 && count.m_swaps == count.m_stop) raise(SIGTERM);
     }

@@ -1,0 +1,111 @@
+#include "third_party_programs.h"
+
+#include <cctype>
+
+namespace {
+
+// The size the composition renderer knows and the profile names: the mask covers the
+// whole window.
+constexpr char WINDOW_SIZE[] = "800x480";
+constexpr char SDL_TESTS[] = "/usr/libexec/installed-tests/SDL2";
+
+// glmark2's default benchmarks, each run as a program of its own for a few frames. Every
+// scene has its own context, as glmark2 makes one per scene.
+struct Glmark2Benchmark {
+    const char* m_description;
+    SceneDepth m_depth;
+    bool m_fast;
+};
+
+const Glmark2Benchmark GLMARK2_BENCHMARKS[] = {
+    {"build:use-vbo=false", SCENE_DEPTH_3D, true},
+    {"build:use-vbo=true", SCENE_DEPTH_3D, false},
+    {"texture:texture-filter=nearest", SCENE_DEPTH_3D, false},
+    {"texture:texture-filter=linear", SCENE_DEPTH_3D, false},
+    {"texture:texture-filter=mipmap", SCENE_DEPTH_3D, false},
+    {"shading:shading=gouraud", SCENE_DEPTH_3D, true},
+    {"shading:shading=blinn-phong-inf", SCENE_DEPTH_3D, false},
+    {"shading:shading=phong", SCENE_DEPTH_3D, true},
+    {"shading:shading=cel", SCENE_DEPTH_3D, false},
+    {"bump:bump-render=high-poly", SCENE_DEPTH_3D, false},
+    {"bump:bump-render=normals", SCENE_DEPTH_3D, false},
+    {"bump:bump-render=height", SCENE_DEPTH_3D, false},
+    {"effect2d:kernel=0,1,0;1,-4,1;0,1,0;", SCENE_DEPTH_FLAT, false},
+    {"effect2d:kernel=1,1,1,1,1;1,1,1,1,1;1,1,1,1,1;", SCENE_DEPTH_FLAT, false},
+    {"pulsar:light=false:quads=5:texture=false", SCENE_DEPTH_3D, false},
+    {"desktop:blur-radius=5:effect=blur:passes=1:separable=true:windows=4", SCENE_DEPTH_FLAT, false},
+    {"desktop:effect=shadow:windows=4", SCENE_DEPTH_FLAT, false},
+    {"buffer:columns=200:interleave=false:update-dispersion=0.9:update-fraction=0.5:update-method=map",
+     SCENE_DEPTH_3D, false},
+    {"buffer:columns=200:interleave=false:update-dispersion=0.9:update-fraction=0.5:update-method=subdata",
+     SCENE_DEPTH_3D, false},
+    {"buffer:columns=200:interleave=true:update-dispersion=0.9:update-fraction=0.5:update-method=map",
+     SCENE_DEPTH_3D, false},
+    {"ideas:speed=duration", SCENE_DEPTH_3D, false},
+    {"jellyfish", SCENE_DEPTH_3D, false},
+    {"terrain", SCENE_DEPTH_3D, false},
+    {"shadow", SCENE_DEPTH_3D, false},
+    {"refract", SCENE_DEPTH_3D, false},
+    {"conditionals:fragment-steps=0:vertex-steps=0", SCENE_DEPTH_FLAT, false},
+    {"conditionals:fragment-steps=5:vertex-steps=0", SCENE_DEPTH_FLAT, false},
+    {"conditionals:fragment-steps=0:vertex-steps=5", SCENE_DEPTH_FLAT, false},
+    {"function:fragment-complexity=low:fragment-steps=5", SCENE_DEPTH_FLAT, false},
+    {"function:fragment-complexity=medium:fragment-steps=5", SCENE_DEPTH_FLAT, false},
+    {"loop:fragment-loop=false:fragment-steps=5:vertex-steps=5", SCENE_DEPTH_FLAT, false},
+    {"loop:fragment-steps=5:fragment-uniform=false:vertex-steps=5", SCENE_DEPTH_FLAT, false},
+    {"loop:fragment-steps=5:fragment-uniform=true:vertex-steps=5", SCENE_DEPTH_FLAT, false},
+};
+
+// SDL's renderer tests on its OpenGL ES 2.0 renderer: 2D, everything at depth 0.
+const char* const SDL_RENDERER_TESTS[] = {"testsprite2",   "testrendercopyex", "testscale",
+                                          "testdraw2",     "testviewport",     "testrendertarget",
+                                          "testgeometry",  "teststreaming"};
+
+// A test name from a benchmark description: letters and digits, the rest one underscore.
+std::string TestName(const std::string& text) {
+    std::string name;
+    for (char each : text) {
+        if (std::isalnum(static_cast<unsigned char>(each))) {
+            name.push_back(each);
+        } else if (!name.empty() && name.back() != '_') {
+            name.push_back('_');
+        }
+    }
+    while (!name.empty() && name.back() == '_') name.pop_back();
+    return name;
+}
+
+}  // namespace
+
+std::vector<ThirdPartyProgram> ThirdPartyPrograms() {
+    std::vector<ThirdPartyProgram> programs;
+    for (const Glmark2Benchmark& benchmark : GLMARK2_BENCHMARKS) {
+        const std::string description = benchmark.m_description;
+        // glmark2 asks for a configuration without stencil unless told: the library gives
+        // every configuration a stencil buffer for the column mask, and glmark2 then finds
+        // none that matches exactly.
+        programs.push_back({"glmark2_" + TestName(description),
+                            {"glmark2-es2", "-b", description + ":nframes=3", "--size", WINDOW_SIZE,
+                             "--visual-config", "stencil=8"},
+                            "", {}, 3, true, REDRAW_CONTINUOUS, benchmark.m_depth, benchmark.m_fast});
+    }
+    programs.push_back({"es2gears_x11", {"es2gears_x11"}, "", {}, 4, false, REDRAW_CONTINUOUS,
+                        SCENE_DEPTH_3D, false});
+    programs.push_back({"es2tri", {"es2tri"}, "", {}, 2, false, REDRAW_ON_EXPOSE, SCENE_DEPTH_FLAT, false});
+    // SDL picks GLX for an OpenGL ES context on X11 when the X server offers it; on a
+    // device it always takes EGL, and so must it here to reach the library.
+    const std::vector<std::string> sdl_environment = {"SDL_VIDEO_X11_FORCE_EGL=1"};
+    programs.push_back({"testgles2", {"./testgles2", "--geometry", WINDOW_SIZE}, SDL_TESTS,
+                        sdl_environment, 4, false, REDRAW_CONTINUOUS, SCENE_DEPTH_3D, true});
+    for (const char* test : SDL_RENDERER_TESTS) {
+        programs.push_back({std::string("sdl_") + test,
+                            {std::string("./") + test, "--renderer", "opengles2", "--geometry", WINDOW_SIZE},
+                            SDL_TESTS, sdl_environment, 4, false, REDRAW_CONTINUOUS, SCENE_DEPTH_FLAT,
+                            false});
+    }
+    return programs;
+}
+
+void PrintTo(const ThirdPartyProgram& program, std::ostream* out) {
+    for (const std::string& argument : program.m_arguments) *out << argument << ' ';
+}
