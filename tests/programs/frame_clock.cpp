@@ -2,24 +2,36 @@
 // the third-party programs: what a program draws then depends on its frame number alone,
 // so a frame drawn on Mesa directly and the same frame drawn through the library show the
 // same moment, however long each took. The swap-capture stand-in calls
-// ovo_frame_clock_advance after every eglSwapBuffers.
+// ovo_frame_clock_advance after every eglSwapBuffers. OVO_FRAME_CLOCK_STEP_MS sets how far
+// one frame moves it (default 1000 / 60), so that a few frames can reach well into an
+// animation.
 #include <dlfcn.h>
 #include <sys/time.h>
 #include <time.h>
 
 #include <atomic>
 #include <cstdint>
+#include <cstdlib>
 
 namespace {
 
 // 2024-01-01 00:00:00 UTC, and 60 frames a second.
 constexpr int64_t FRAME_CLOCK_START_SECONDS = 1704067200;
-constexpr int64_t FRAME_CLOCK_FRAME_NANOSECONDS = 1000000000 / 60;
+constexpr int64_t FRAME_CLOCK_DEFAULT_STEP_NANOSECONDS = 1000000000 / 60;
 
 std::atomic<int64_t> g_frames{0};
 
+int64_t StepNanoseconds() {
+    static const int64_t step = [] {
+        const char* milliseconds = std::getenv("OVO_FRAME_CLOCK_STEP_MS");
+        const long long value = milliseconds != nullptr ? std::atoll(milliseconds) : 0;
+        return value > 0 ? static_cast<int64_t>(value) * 1000000 : FRAME_CLOCK_DEFAULT_STEP_NANOSECONDS;
+    }();
+    return step;
+}
+
 timespec Now() {
-    const int64_t nanoseconds = g_frames.load(std::memory_order_relaxed) * FRAME_CLOCK_FRAME_NANOSECONDS;
+    const int64_t nanoseconds = g_frames.load(std::memory_order_relaxed) * StepNanoseconds();
     return {static_cast<time_t>(FRAME_CLOCK_START_SECONDS + nanoseconds / 1000000000),
             static_cast<long>(nanoseconds % 1000000000)};
 }
@@ -50,7 +62,8 @@ __attribute__((visibility("default"))) int clock_gettime(clockid_t clock, timesp
 
 __attribute__((visibility("default"))) int gettimeofday(timeval* now, void*) {
     const timespec clock = Now();
-    if (now != nullptr) *now = {clock.tv_sec, static_cast<suseconds_t>(clock.tv_nsec / 1000)};
+    now->tv_sec = clock.tv_sec;
+    now->tv_usec = static_cast<suseconds_t>(clock.tv_nsec / 1000);
     return 0;
 }
 
