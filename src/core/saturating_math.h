@@ -12,11 +12,13 @@ namespace ovo {
 // 2^31, exact in single precision: every float below it and not below its negation fits.
 constexpr float SATURATING_FLOAT_LIMIT = 2147483648.0f;
 
-// Toward zero, as a cast; beyond the range its nearer end; NaN gives 0.
+// Toward zero, as a cast; beyond the range its nearer end; NaN gives 0. A value in range
+// costs two comparisons.
 inline int32_t SaturatingTrunc(float value) {
-    if (value >= SATURATING_FLOAT_LIMIT) return INT32_MAX;
-    if (value < -SATURATING_FLOAT_LIMIT) return INT32_MIN;
-    return value == value ? static_cast<int32_t>(value) : 0;
+    if (value < SATURATING_FLOAT_LIMIT && value >= -SATURATING_FLOAT_LIMIT) {
+        return static_cast<int32_t>(value);
+    }
+    return value > 0.0f ? INT32_MAX : value < 0.0f ? INT32_MIN : 0;
 }
 
 inline int32_t SaturateToInt32(int64_t value) {
