@@ -1,8 +1,7 @@
 #include "stereo/double_width_draws.h"
 
-#include <cstdint>
-
 #include "core/raw_gl.h"
+#include "core/saturating_math.h"
 #include "core/stereo_manager.h"
 #include "stereo/depth_shift.h"
 #include "stereo/draw_call.h"
@@ -25,7 +24,7 @@ EyeTexturePair& PreparedEyeTextures(StereoManager& manager) {
 }  // namespace
 
 GLsizei DoubleWidth(GLsizei width) {
-    return width > INT32_MAX / 2 ? INT32_MAX : width * 2;
+    return SaturatingMul(width, 2);
 }
 
 void WidenRenderTexture(StereoManager& manager, GLuint texture) {
@@ -57,7 +56,7 @@ void DrawIntoDoubleWidth(StereoManager& manager, const DrawCall& draw) {
     const GLint half = framebuffer != nullptr ? static_cast<GLint>(framebuffer->m_width) : 0;
     const GlRect& viewport = manager.m_viewport;
     for (int eye = 0; eye < 2; ++eye) {
-        raw::glViewport(viewport.m_x + eye * half, viewport.m_y, viewport.m_width,
+        raw::glViewport(SaturatingAdd(viewport.m_x, eye * half), viewport.m_y, viewport.m_width,
                         viewport.m_height);
         SetDepthShift(manager, eye);
         draw.Issue();

@@ -9,7 +9,7 @@ class StereoManager;
 struct DrawCall;
 struct TextureRecord;
 
-// `width` doubled, held at the largest GLsizei rather than overflowing.
+// `width` doubled, held at the int32 range rather than overflowing.
 GLsizei DoubleWidth(GLsizei width);
 
 // After the application attached `texture` to its bound framebuffer: the texture becomes

@@ -1,6 +1,7 @@
 #include "stereo/es1_sprite_stereo_layer.h"
 
 #include "core/raw_gl.h"
+#include "core/saturating_math.h"
 #include "core/stereo_manager.h"
 #include "stereo/draw_call.h"
 #include "stereo/es1_eye_clear.h"
@@ -25,7 +26,7 @@ void Es1SpriteStereoLayer::Draw(StereoManager& manager, const DrawCall& draw) {
         if (snapshot.IsFlat()) {
             // Whole units of the plane only: the product is truncated before it is scaled.
             const float distance = EyeSign(eye) * manager.m_profile->m_eye_distance;
-            const int units = static_cast<int>(distance * manager.m_depth_plane);
+            const int32_t units = SaturatingTrunc(distance * manager.m_depth_plane);
             raw::glTranslatef(static_cast<float>(units) * manager.m_depth_unit, 0.0f, 0.0f);
         }
     });

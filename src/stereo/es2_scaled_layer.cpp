@@ -1,6 +1,7 @@
 #include "stereo/es2_scaled_layer.h"
 
 #include "core/raw_gl.h"
+#include "core/saturating_math.h"
 #include "core/stereo_manager.h"
 #include "stereo/draw_call.h"
 #include "stereo/gl_object_tracker.h"
@@ -10,7 +11,7 @@ namespace ovo {
 namespace {
 
 GLint Scaled(GLint value, float scale) {
-    return static_cast<GLint>(static_cast<float>(value) * scale);
+    return SaturatingTrunc(static_cast<float>(value) * scale);
 }
 
 }  // namespace

@@ -126,7 +126,9 @@ void Es2StereoLayer::glDeleteShader(StereoManager& manager, GLuint shader) {
 
 void Es2StereoLayer::glClear(StereoManager& manager, GLbitfield mask) {
     // Render targets are twice as wide as the game believes.
-    if (Tracked()) raw::glScissor(0, 0, 2 * manager.m_profile->m_width, manager.m_profile->m_height);
+    if (Tracked()) {
+        raw::glScissor(0, 0, DoubleWidth(manager.m_profile->m_width), manager.m_profile->m_height);
+    }
     raw::glClear(mask);
 }
 

@@ -1,6 +1,7 @@
 #include "stereo/eye_viewport.h"
 
 #include "core/raw_gl.h"
+#include "core/saturating_math.h"
 #include "core/stereo_manager.h"
 
 namespace ovo {
@@ -10,23 +11,21 @@ namespace {
 // One rectangle as glViewport and glScissor take it; `Set` is either of the two.
 using SetRect = void (*)(GLint, GLint, GLsizei, GLsizei);
 
-// Float to int toward zero, as a C cast does; the sums are single precision.
-inline GLint Trunc(float value) { return static_cast<GLint>(value); }
-
-// The width gets 0.5 before truncation: side by side, and the scaled flat draw.
+// The sums are single precision, truncated toward zero. The width gets 0.5 before
+// truncation: side by side, and the scaled flat draw.
 void SetWidthRounded(SetRect set, const GlRect& r, float x_offset, float scale_x, float scale_y) {
-    set(Trunc(x_offset + static_cast<float>(r.m_x) * scale_x),
-        Trunc(static_cast<float>(r.m_y) * scale_y),
-        Trunc(0.5f + static_cast<float>(r.m_width) * scale_x),
-        Trunc(static_cast<float>(r.m_height) * scale_y));
+    set(SaturatingTrunc(x_offset + static_cast<float>(r.m_x) * scale_x),
+        SaturatingTrunc(static_cast<float>(r.m_y) * scale_y),
+        SaturatingTrunc(0.5f + static_cast<float>(r.m_width) * scale_x),
+        SaturatingTrunc(static_cast<float>(r.m_height) * scale_y));
 }
 
 // The height gets 0.5 before truncation: top and bottom.
 void SetHeightRounded(SetRect set, const GlRect& r, float y_offset, float scale_x, float scale_y) {
-    set(Trunc(static_cast<float>(r.m_x) * scale_x),
-        Trunc(y_offset + static_cast<float>(r.m_y) * scale_y),
-        Trunc(static_cast<float>(r.m_width) * scale_x),
-        Trunc(0.5f + static_cast<float>(r.m_height) * scale_y));
+    set(SaturatingTrunc(static_cast<float>(r.m_x) * scale_x),
+        SaturatingTrunc(y_offset + static_cast<float>(r.m_y) * scale_y),
+        SaturatingTrunc(static_cast<float>(r.m_width) * scale_x),
+        SaturatingTrunc(0.5f + static_cast<float>(r.m_height) * scale_y));
 }
 
 void SetViewport(GLint x, GLint y, GLsizei w, GLsizei h) { raw::glViewport(x, y, w, h); }

@@ -2,6 +2,7 @@
 // the application's state saved before and put back after.
 #include "core/gl_state_table.h"
 #include "core/raw_gl.h"
+#include "core/saturating_math.h"
 #include "stereo/overlay_target.h"
 
 namespace ovo {
@@ -95,8 +96,8 @@ void OverlayTarget::Compose(const ComposeQuad* quads, int32_t quad_count, float 
     raw::glEnableClientState(GL_VERTEX_ARRAY);
     raw::glDisableClientState(GL_COLOR_ARRAY);
 
-    const GLsizei width = static_cast<GLsizei>(w);
-    const GLsizei height = static_cast<GLsizei>(h);
+    const GLsizei width = SaturatingTrunc(w);
+    const GLsizei height = SaturatingTrunc(h);
     for (int32_t i = 0; i < quad_count; ++i) {
         const ComposeQuad& quad = quads[i];
         const GLfloat strip[12] = {quad.m_left,  y, z, quad.m_left,  y + h, z,

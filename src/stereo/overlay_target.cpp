@@ -1,6 +1,7 @@
 #include "stereo/overlay_target.h"
 
 #include "core/raw_gl.h"
+#include "core/saturating_math.h"
 #include "core/stereo_manager.h"
 #include "stereo/draw_call.h"
 
@@ -120,7 +121,7 @@ void OverlayTarget::ComposeStereo(const StereoManager& manager, float x, float y
     // the whole overlay, whatever the split and eye order.
     const float shift = manager.m_profile->m_eye_shift * 400.0f;
     const ComposeQuad quads[2] = {{x, x + w + shift, 0},
-                                  {x - shift, x + w, static_cast<GLint>(w)}};
+                                  {x - shift, x + w, SaturatingTrunc(w)}};
     Compose(quads, 2, y, w, h, z, t);
 }
 
