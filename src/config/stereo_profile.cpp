@@ -15,7 +15,8 @@ namespace {
 constexpr const char SELF_COMMAND_LINE[] = "/proc/self/cmdline";
 }  // namespace
 
-StereoProfile::StereoProfile() : StereoProfileFields(), m_item_table{} {
+StereoProfile::StereoProfile()
+    : StereoProfileFields(), m_item_table{}, m_command_line(LocateCommandLineArea()) {
     // The fields hold their defaults (StereoProfileFields).
     if (LoadProfile()) {
         m_enabled = true;
@@ -64,13 +65,25 @@ StereoMode StereoProfile::ApplyScreenSize() {
 
 int StereoProfile::DetectLiveWallpaper() {
     char name[PROFILE_PROCESS_NAME_CAPACITY];
+    switch (ReadNameInArea(m_command_line, name)) {
+    case COMMAND_LINE_NAME_READ:
+        return LiveWallpaperKindOf(name);
+    case COMMAND_LINE_NAME_RUNS_ON:
+        // The name only grows past the area; unless that could still make a wallpaper's
+        // name, it is none.
+        if (!IsLiveWallpaperNamePrefix(name)) return LIVE_WALLPAPER_NONE;
+        break;
+    case COMMAND_LINE_AREA_UNKNOWN:
+        break;
+    }
     if (!ReadProcessName(name)) return LIVE_WALLPAPER_NONE;
     return LiveWallpaperKindOf(name);
 }
 
 bool StereoProfile::ReadProcessName(char* name) {
     name[0] = '\0';
-    // Plain system calls: the stereo draws ask for the name per eye, and must not allocate.
+    // Plain system calls: a draw may still come here (DetectLiveWallpaper), and must not
+    // allocate.
     const int file = open(SELF_COMMAND_LINE, O_RDONLY | O_CLOEXEC);
     if (file < 0) return false;
     // The last byte is kept for the terminator, so a long name is cut inside the buffer.

@@ -3,6 +3,7 @@
 
 #include <cstdint>
 
+#include "config/command_line_area.h"
 #include "config/profile_file.h"
 #include "config/stereo_profile_fields.h"
 
@@ -32,7 +33,10 @@ public:
     StereoMode ResolveMode();
     // Takes the output size from the screen or the eye target, then resolves the mode.
     StereoMode ApplyScreenSize();
-    // The live-wallpaper kind (1..6) of this process, 0 when it is none.
+    // The live-wallpaper kind (1..6) of this process, 0 when it is none. The name is read
+    // anew at each call, so that a rename after start is seen: from the argument area in
+    // memory (no system call; the stereo draws ask per eye), from the file only where the
+    // area is not known or the name runs on past it.
     int DetectLiveWallpaper();
 
     // The item table of the last LoadProfile (header words and 32 slots).
@@ -45,6 +49,9 @@ public:
 
 private:
     ProfileTable m_item_table;
+    // Where the process's arguments lie, found once at construction; a rename later writes
+    // over them in place.
+    CommandLineArea m_command_line;
 };
 
 }  // namespace ovo

@@ -141,6 +141,14 @@ int LiveWallpaperKindOf(const char* process_name) {
     return LIVE_WALLPAPER_NONE;
 }
 
+bool IsLiveWallpaperNamePrefix(const char* prefix) {
+    const size_t length = std::strlen(prefix);
+    for (const LiveWallpaperName& wallpaper : LIVE_WALLPAPERS) {
+        if (std::strncmp(wallpaper.m_name, prefix, length) == 0) return true;
+    }
+    return false;
+}
+
 void ApplyLiveWallpaperPreset(StereoProfileFields& fields, int kind) {
     if (kind < LIVE_WALLPAPER_SNOWFALL || kind > LIVE_WALLPAPER_PACK_EARTH) return;
     const LiveWallpaperPreset& preset = PRESETS[kind - 1];

@@ -116,6 +116,9 @@ StereoMode ModeForProcess(const StereoProfileFields& fields, const char* process
 // The live-wallpaper kind of `process_name` (null or unknown: LIVE_WALLPAPER_NONE).
 int LiveWallpaperKindOf(const char* process_name);
 
+// Some live wallpaper's name begins with `prefix` (or is it).
+bool IsLiveWallpaperNamePrefix(const char* prefix);
+
 // Overwrites the fields with the preset of `kind` (1..6); any other kind changes nothing.
 // m_eye_shift_set and m_ramp_param keep their values.
 void ApplyLiveWallpaperPreset(StereoProfileFields& fields, int kind);

@@ -266,6 +266,11 @@ TEST(ProcessNamesTest, NamesAreComparedExactly) {
                                                  {"com.android.wallpaper.livepicker", 0}, {"fishnoodle.snowfal", 0},
                                                  {nullptr, 0}};
     for (auto [name, kind] : cases) EXPECT_EQ(ovo::LiveWallpaperKindOf(name), kind) << (name ? name : "null");
+    // What a name cut at the end of the argument area may still grow into.
+    const std::pair<const char*, bool> prefixes[] = {{"com", true}, {"com.android.wallpaper", true},
+                                                     {"com.android.wallpaperX", false}, {"fishnoodle.clouds_fre", true},
+                                                     {"ffishnoodle", false}};
+    for (auto [prefix, begins] : prefixes) EXPECT_EQ(ovo::IsLiveWallpaperNamePrefix(prefix), begins) << prefix;
 }
 
 // Kinds outside 1..6 would index past the preset table.

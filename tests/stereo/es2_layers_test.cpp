@@ -1,6 +1,15 @@
 // The OpenGL ES 2.0 layers on the recording vendor: the exact calls of the shader
-// injection, of each draw path and of the render-texture bookkeeping.
+// injection, of each draw path (the stock live wallpaper's across a rename) and of the
+// render-texture bookkeeping.
+#include <sys/prctl.h>
+
+#include <algorithm>
+#include <cerrno>
+#include <cstdio>
+#include <cstdlib>
 #include <cstring>
+#include <iterator>
+#include <string>
 #include <utility>
 
 #include "stereo/es2_scaled_layer.h"
@@ -139,6 +148,95 @@ TEST(Es2WallpaperTest, TheStockWallpapersArrayDrawsAddItsOwnSeparationPerEye) {
         logged += result.m_output.substr(at, result.m_output.find('\n', at) + 1 - at);
     }
     EXPECT_EQ(logged, expected) << result.m_output;
+}
+
+// A rename after start, as Android renames a process forked from the zygote: a name written
+// over the argument strings in place, and given to prctl(PR_SET_NAME).
+struct Rename {
+    const char* m_label;
+    std::string m_command_line;  // the arguments at start, separated by NULs
+    std::string m_environment;   // the first environment string, which lies right past them
+    std::string m_written;       // written over the arguments from the first one's start
+    int m_rest;                  // then over the rest of them, unless RENAME_KEEPS_THE_REST
+    int m_kind;                  // the live-wallpaper kind after the rename
+};
+constexpr int RENAME_KEEPS_THE_REST = -1;
+const std::string START = std::string("com.example.game\0--a-flag-long-enough-for-any-name", 50);
+
+const Rename RENAMES[] = {
+    {"a longer name, into the next argument", START, "", "com.android.wallpaper", '\0', 2},
+    {"a shorter name", "com.android.wallpaper.livepicker", "", "com.android.wallpaper", '\0', 2},
+    {"away from the wallpaper", "com.android.wallpaper", "", "com.example.game", '\0', 0},
+    {"another kind", START, "", "fishnoodle.koipond", '\0', 3},
+    {"the longest name", START, "", "au.com.dealsmap.lwp.cube.PackEarth", '\0', 6},
+    {"a name and its NUL, the rest kept", START, "", std::string("com.android.wallpaper\0", 22),
+     RENAME_KEEPS_THE_REST, 2},
+    {"no NUL, over a longer name", "com.android.wallpaperXYZ", "", "com.android.wallpaper",
+     RENAME_KEEPS_THE_REST, 0},
+    {"a space in front", START, "", " com.android.wallpaper", '\0', 0},
+    {"a space behind", START, "", "com.android.wallpaper ", '\0', 0},
+    {"a tab behind", START, "", "com.android.wallpaper\t", '\0', 0},
+    {"empty", "com.android.wallpaper", "", "", '\0', 0},
+    // Without a NUL in the area the kernel reads on into the environment.
+    {"no NUL left in the area", START, "", "com.android.wallpaper", 'x', 0},
+    {"no NUL, the environment ends the wallpaper's name", "cX", ".android.wallpaper", "com",
+     RENAME_KEEPS_THE_REST, 2},
+    {"no NUL, the environment ends another name", "cX", ".android.wallpaper.x", "com",
+     RENAME_KEEPS_THE_REST, 0},
+    {"no NUL, no wallpaper's name begins so", "xX", ".android.wallpaper", "xom",
+     RENAME_KEEPS_THE_REST, 0},
+};
+
+// Draws once into the window; how many eyes set the stock wallpaper's own separation.
+int WallpaperSetups(ovo::Es2StereoLayer& layer, ovo::StereoManager& manager) {
+    ResetRecorder();
+    layer.glDrawArrays(manager, GL_TRIANGLES, 0, 3);
+    const Calls calls = RecordedGlCalls();
+    return static_cast<int>(std::count(calls.begin(), calls.end(), "glUniform2f(4, 0.1, 0.05)") +
+                            std::count(calls.begin(), calls.end(), "glUniform2f(4, -0.1, -0.05)"));
+}
+
+// Run under a case's command line: a draw, the case's rename, a draw, and what the profile
+// and the file then say.
+TEST_F(Es2LayerTest, DISABLED_PrintDrawsAcrossARename) {
+    const char* index = std::getenv("OVO_RENAME_CASE");
+    ASSERT_NE(index, nullptr);
+    const Rename& rename = RENAMES[std::atoi(index)];
+    // The arguments lie one after the other from the first; the file shows them all while
+    // the last one ends in its NUL.
+    const size_t area_length = CommandLineFile().size();
+    ASSERT_LE(rename.m_written.size(), area_length);
+    Interleave(true);
+    Profile().m_ramp = ovo::STEREO_RAMP_OFF;
+    const int before = WallpaperSetups(m_direct, Manager());
+    prctl(PR_SET_NAME, rename.m_written.c_str());
+    char* area = program_invocation_name;
+    std::memcpy(area, rename.m_written.data(), rename.m_written.size());
+    if (rename.m_rest != RENAME_KEEPS_THE_REST) {
+        std::memset(area + rename.m_written.size(), rename.m_rest, area_length - rename.m_written.size());
+    }
+    const int after = WallpaperSetups(m_direct, Manager());
+    char name[ovo::PROFILE_PROCESS_NAME_CAPACITY];
+    ovo::StereoProfile::ReadProcessName(name);
+    std::printf("wallpaper setups %d then %d, detected %d, file %d\n", before, after,
+                Profile().DetectLiveWallpaper(), ovo::LiveWallpaperKindOf(name));
+}
+
+TEST(Es2WallpaperTest, ARenameIsSeenAtTheNextDrawAsTheFileShowsIt) {
+    if (!CommandLineFileFollowsRenames()) GTEST_SKIP() << "/proc/self/cmdline does not follow renames here";
+    for (size_t index = 0; index < std::size(RENAMES); ++index) {
+        const Rename& rename = RENAMES[index];
+        std::string environment = "OVO_RENAME_CASE=" + std::to_string(index);
+        if (!rename.m_environment.empty()) environment = rename.m_environment + '\0' + environment;
+        const ScenarioResult result =
+            RunScenario(rename.m_command_line, "Es2LayerTest.DISABLED_PrintDrawsAcrossARename", environment);
+        const bool wallpaper_at_start = std::string(rename.m_command_line.c_str()) == "com.android.wallpaper";
+        const bool wallpaper_after = rename.m_kind == ovo::LIVE_WALLPAPER_ANDROID;
+        char expected[96];
+        std::snprintf(expected, sizeof(expected), "wallpaper setups %d then %d, detected %d, file %d\n",
+                      wallpaper_at_start ? 2 : 0, wallpaper_after ? 2 : 0, rename.m_kind, rename.m_kind);
+        EXPECT_NE(result.m_output.find(expected), std::string::npos) << rename.m_label << "\n" << result.m_output;
+    }
 }
 
 class TrackedLayerTest : public Es2LayerTest {
