@@ -120,6 +120,17 @@ TEST_F(FramesToolTest, BadInputNamesTheFileAndLeavesNoOutput) {
         {{"preview", "eye.png", "--eye0-columns", "left"}, "ovo-frames: --eye0-columns: 'left' is neither"},
         {{"preview", "eye.png", "--eye0-columns", "odd", "--tolerance", "1"}, "ovo-frames: --tolerance: unknown option"},
         {{"preview", "eye.png", "eye.png", "--eye0-columns", "odd"}, "ovo-frames: preview: takes one image"},
+        {{"interleave", "eye.png", "eye.png", "--eye0-columns", "odd", "--mask-area", "4x1"},
+         "ovo-frames: --mask-area: goes with --outside-eye"},
+        {{"interleave", "eye.png", "eye.png", "--eye0-columns", "odd", "--outside-eye", "1"},
+         "ovo-frames: --mask-area: goes with --outside-eye"},
+        {{"interleave", "eye.png", "eye.png", "--eye0-columns", "odd", "--mask-area", "4x0", "--outside-eye", "1"},
+         "ovo-frames: --mask-area: '4x0' is not WxH"},
+        {{"interleave", "eye.png", "eye.png", "--eye0-columns", "odd", "--mask-area", "4x1x", "--outside-eye", "1"},
+         "ovo-frames: --mask-area: '4x1x' is not WxH"},
+        {{"interleave", "eye.png", "eye.png", "--eye0-columns", "odd", "--mask-area", "4x1", "--outside-eye", "2"},
+         "ovo-frames: --outside-eye: '2' is neither 0 nor 1"},
+        {{"preview", "eye.png", "--eye0-columns", "odd", "--mask-area", "4x1"}, "ovo-frames: --mask-area: unknown option"},
     };
     for (const auto& test : cases) {
         std::vector<std::string> arguments = test.m_arguments;

@@ -20,15 +20,20 @@ using ovo_frames::RgbaFrame;
 constexpr int EXIT_DIFFERENT = 1;
 constexpr int EXIT_TROUBLE = 2;
 constexpr long TOLERANCE_MAX = 255;
+// As large as the samples' pbuffers go.
+constexpr long FRAME_SIDE_MAX = 8192;
 
 const char USAGE[] =
-    "usage: ovo-frames interleave EYE0.png EYE1.png --eye0-columns even|odd -o OUT.png\n"
+    "usage: ovo-frames interleave EYE0.png EYE1.png --eye0-columns even|odd\n"
+    "                  [--mask-area WxH --outside-eye 0|1] -o OUT.png\n"
     "       ovo-frames preview RAW.png --eye0-columns even|odd -o OUT.png\n"
     "       ovo-frames anaglyph RAW.png --eye0-columns even|odd -o OUT.png\n"
     "       ovo-frames compare A.png B.png [--tolerance N]\n"
     "\n"
     "interleave  the frame the panel receives: the columns of one parity (0, 2, 4, ... are\n"
     "            even) from eye 0's image, the others from eye 1's image of the same size.\n"
+    "            With a mask area, only its lower-left W x H pixels are interleaved (the\n"
+    "            mask's reach) and the rest comes from the outside eye's image.\n"
     "preview     the two eyes of an interleaved frame side by side, eye 0 on the left, each\n"
     "            at full width (its columns doubled): 2W x H.\n"
     "anaglyph    red-cyan anaglyph of an interleaved frame: red from eye 0 (left), green\n"
@@ -43,6 +48,8 @@ struct Arguments {
     const char* m_output = nullptr;
     const char* m_eye0_columns = nullptr;
     const char* m_tolerance = nullptr;
+    const char* m_mask_area = nullptr;
+    const char* m_outside_eye = nullptr;
 };
 
 struct Command {
@@ -85,7 +92,49 @@ ColumnParity Eye0Columns(const Arguments& arguments) {
                                                              : ovo_frames::COLUMN_PARITY_EVEN;
 }
 
+// "WxH", both sides from 1 to FRAME_SIDE_MAX.
+bool ParseSize(const char* text, int32_t* width, int32_t* height) {
+    long sides[2] = {0, 0};
+    for (int side = 0; side < 2; ++side) {
+        if (*text < '0' || *text > '9') return false;
+        char* end = nullptr;
+        errno = 0;
+        sides[side] = std::strtol(text, &end, 10);
+        if (errno != 0 || sides[side] < 1 || sides[side] > FRAME_SIDE_MAX) return false;
+        text = end;
+        if (*text++ != (side == 0 ? 'x' : '\0')) return false;
+    }
+    *width = static_cast<int32_t>(sides[0]);
+    *height = static_cast<int32_t>(sides[1]);
+    return true;
+}
+
+// The mask area of the command line, or null without one; false after a usage error.
+bool ReadMaskArea(const Arguments& arguments, ovo_frames::MaskArea* area, const ovo_frames::MaskArea** chosen) {
+    *chosen = nullptr;
+    if (arguments.m_mask_area == nullptr && arguments.m_outside_eye == nullptr) return true;
+    if (arguments.m_mask_area == nullptr || arguments.m_outside_eye == nullptr) {
+        UsageError("--mask-area", "goes with --outside-eye");
+        return false;
+    }
+    if (!ParseSize(arguments.m_mask_area, &area->m_width, &area->m_height)) {
+        UsageError("--mask-area", std::string("'") + arguments.m_mask_area + "' is not WxH");
+        return false;
+    }
+    const std::string eye = arguments.m_outside_eye;
+    if (eye != "0" && eye != "1") {
+        UsageError("--outside-eye", "'" + eye + "' is neither 0 nor 1");
+        return false;
+    }
+    area->m_outside_eye = eye == "1" ? 1 : 0;
+    *chosen = area;
+    return true;
+}
+
 int RunInterleave(const Arguments& arguments) {
+    ovo_frames::MaskArea area = {};
+    const ovo_frames::MaskArea* mask_area = nullptr;
+    if (!ReadMaskArea(arguments, &area, &mask_area)) return EXIT_TROUBLE;
     RgbaFrame eye0;
     RgbaFrame eye1;
     if (!Load(arguments.m_files[0], &eye0) || !Load(arguments.m_files[1], &eye1)) return EXIT_TROUBLE;
@@ -93,7 +142,8 @@ int RunInterleave(const Arguments& arguments) {
         return Fail(arguments.m_files[1],
                     SizeText(eye1) + ", but " + arguments.m_files[0] + " is " + SizeText(eye0));
     }
-    return Save(arguments.m_output, ovo_frames::Interleave(eye0, eye1, Eye0Columns(arguments)));
+    return Save(arguments.m_output,
+                ovo_frames::Interleave(eye0, eye1, Eye0Columns(arguments), mask_area));
 }
 
 // An interleaved frame, whose eyes' columns come in pairs.
@@ -168,13 +218,17 @@ struct Option {
     const char* Arguments::*m_value;
     // Offered by the commands that make a frame, or by the others.
     bool m_makes_frame;
+    // Offered by this command alone; null: by all of its kind.
+    const char* m_command;
 };
 
 const Option OPTIONS[] = {
-    {"-o", &Arguments::m_output, true},
-    {"--output", &Arguments::m_output, true},
-    {"--eye0-columns", &Arguments::m_eye0_columns, true},
-    {"--tolerance", &Arguments::m_tolerance, false},
+    {"-o", &Arguments::m_output, true, nullptr},
+    {"--output", &Arguments::m_output, true, nullptr},
+    {"--eye0-columns", &Arguments::m_eye0_columns, true, nullptr},
+    {"--mask-area", &Arguments::m_mask_area, true, "interleave"},
+    {"--outside-eye", &Arguments::m_outside_eye, true, "interleave"},
+    {"--tolerance", &Arguments::m_tolerance, false, nullptr},
 };
 
 // The option of `command` that `argument` names, as "NAME" or "NAME=VALUE" (then `value`
@@ -182,6 +236,7 @@ const Option OPTIONS[] = {
 const Option* FindOption(const Command& command, const char* argument, const char** value) {
     for (const Option& option : OPTIONS) {
         if (option.m_makes_frame != command.m_makes_frame) continue;
+        if (option.m_command != nullptr && std::strcmp(option.m_command, command.m_name) != 0) continue;
         const size_t length = std::strlen(option.m_name);
         if (std::strncmp(argument, option.m_name, length) != 0) continue;
         if (argument[length] == '=') *value = argument + length + 1;
