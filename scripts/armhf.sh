@@ -6,14 +6,15 @@
 #     presentation, stereo layers, shader rewriter, tools, exports, fuzz corpora);
 #   - with Mesa's armhf libraries, tests on Mesa (llvmpipe under the emulator, slow):
 #     OVO_ARMHF_MESA=some (the default) the unit tests on Mesa and the samples' plain
-#     renderings, =all every test on Mesa (the stereo frames too), =none none.
+#     renderings, =all every test on Mesa (the stereo frames and lifecycle scenarios too),
+#     =none none.
 # The groups are told apart by name: tests on Mesa match $mesa_tests, the subset
 # $mesa_subset.
 set -euo pipefail
 root="$(cd "$(dirname "$0")/.." && pwd)"
 build="${OVO_ARMHF_BUILD_DIR:-$root/build-armhf}"
 mesa_choice="${OVO_ARMHF_MESA:-some}"
-mesa_tests='^(EndToEnd|SwapCapture)\.|OnMesa'
+mesa_tests='^(EndToEnd|SwapCapture|Lifecycle)\.|OnMesa'
 mesa_subset='OnMesa'
 started=$SECONDS
 

@@ -26,4 +26,10 @@ void DeleteTexture(uint32_t* texture) {
     *texture = 0;
 }
 
+void ReplaceTexture(uint32_t* texture, uint32_t replacement) {
+    if (*texture == replacement) return;
+    DeleteTexture(texture);
+    *texture = replacement;
+}
+
 }  // namespace ovo_sample

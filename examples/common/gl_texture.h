@@ -22,6 +22,10 @@ uint32_t CreateTexture(const RgbaImage& image, const TextureSampling& sampling);
 
 void DeleteTexture(uint32_t* texture);
 
+// `*texture` becomes `replacement`, a texture made elsewhere; the one it held before is
+// deleted (unless it is the same).
+void ReplaceTexture(uint32_t* texture, uint32_t replacement);
+
 }  // namespace ovo_sample
 
 #endif

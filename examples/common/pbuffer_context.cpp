@@ -29,9 +29,8 @@ bool PbufferContext::Fail(const char* call) {
     return false;
 }
 
-bool PbufferContext::ChooseConfig(EGLint client_version, EGLint stencil_bits,
-                                  EGLConfig* config) {
-    const EGLint renderable = client_version >= 2 ? EGL_OPENGL_ES2_BIT : EGL_OPENGL_ES_BIT;
+bool PbufferContext::ChooseConfig() {
+    const EGLint renderable = m_client_version >= 2 ? EGL_OPENGL_ES2_BIT : EGL_OPENGL_ES_BIT;
     const EGLint attributes[] = {EGL_SURFACE_TYPE, EGL_PBUFFER_BIT,
                                  EGL_RENDERABLE_TYPE, renderable,
                                  EGL_RED_SIZE, COLOR_BITS,
@@ -39,7 +38,7 @@ bool PbufferContext::ChooseConfig(EGLint client_version, EGLint stencil_bits,
                                  EGL_BLUE_SIZE, COLOR_BITS,
                                  EGL_ALPHA_SIZE, COLOR_BITS,
                                  EGL_DEPTH_SIZE, DEPTH_BITS,
-                                 EGL_STENCIL_SIZE, stencil_bits,
+                                 EGL_STENCIL_SIZE, m_stencil_bits,
                                  EGL_NONE};
     EGLConfig configs[EGL_CONFIG_CAPACITY];
     EGLint count = 0;
@@ -50,7 +49,7 @@ bool PbufferContext::ChooseConfig(EGLint client_version, EGLint stencil_bits,
     // that read pixels back do.
     for (EGLint i = 0; i < count; ++i) {
         if (HasExactColor(m_display, configs[i])) {
-            *config = configs[i];
+            m_config = configs[i];
             return true;
         }
     }
@@ -62,6 +61,13 @@ bool PbufferContext::ChooseConfig(EGLint client_version, EGLint stencil_bits,
 bool PbufferContext::Create(const char* program, EGLint client_version, EGLint stencil_bits,
                             int32_t width, int32_t height) {
     m_program = program;
+    m_client_version = client_version;
+    m_stencil_bits = stencil_bits;
+    return OpenDisplay() && CreateSurface(width, height) && CreateContext(EGL_NO_CONTEXT) &&
+           MakeCurrent();
+}
+
+bool PbufferContext::OpenDisplay() {
     m_display = eglGetDisplay(EGL_DEFAULT_DISPLAY);
     if (m_display == EGL_NO_DISPLAY) return Fail("eglGetDisplay");
     EGLint major = 0;
@@ -71,22 +77,59 @@ bool PbufferContext::Create(const char* program, EGLint client_version, EGLint s
         return Fail("eglInitialize");
     }
     if (!eglBindAPI(EGL_OPENGL_ES_API)) return Fail("eglBindAPI");
+    return ChooseConfig();
+}
 
-    EGLConfig config = nullptr;
-    if (!ChooseConfig(client_version, stencil_bits, &config)) return false;
+void PbufferContext::BorrowDisplay(const PbufferContext& owner) {
+    m_program = owner.m_program;
+    m_client_version = owner.m_client_version;
+    m_stencil_bits = owner.m_stencil_bits;
+    m_display = owner.m_display;
+    m_config = owner.m_config;
+    m_display_borrowed = true;
+}
 
-    const EGLint surface_attributes[] = {EGL_WIDTH, width, EGL_HEIGHT, height, EGL_NONE};
-    m_surface = eglCreatePbufferSurface(m_display, config, surface_attributes);
-    if (m_surface == EGL_NO_SURFACE) return Fail("eglCreatePbufferSurface");
+bool PbufferContext::CreateSurface(int32_t width, int32_t height) {
+    const EGLint attributes[] = {EGL_WIDTH, width, EGL_HEIGHT, height, EGL_NONE};
+    m_surface = eglCreatePbufferSurface(m_display, m_config, attributes);
+    return m_surface != EGL_NO_SURFACE || Fail("eglCreatePbufferSurface");
+}
 
-    const EGLint context_attributes[] = {EGL_CONTEXT_CLIENT_VERSION, client_version, EGL_NONE};
-    m_context = eglCreateContext(m_display, config, EGL_NO_CONTEXT, context_attributes);
-    if (m_context == EGL_NO_CONTEXT) return Fail("eglCreateContext");
+bool PbufferContext::CreateContext(EGLContext share_with) {
+    const EGLint attributes[] = {EGL_CONTEXT_CLIENT_VERSION, m_client_version, EGL_NONE};
+    m_context = eglCreateContext(m_display, m_config, share_with, attributes);
+    return m_context != EGL_NO_CONTEXT || Fail("eglCreateContext");
+}
 
-    if (!eglMakeCurrent(m_display, m_surface, m_surface, m_context)) {
-        return Fail("eglMakeCurrent");
-    }
-    return true;
+bool PbufferContext::MakeCurrent() {
+    return eglMakeCurrent(m_display, m_surface, m_surface, m_context) || Fail("eglMakeCurrent");
+}
+
+bool PbufferContext::ReleaseCurrent() {
+    return eglMakeCurrent(m_display, EGL_NO_SURFACE, EGL_NO_SURFACE, EGL_NO_CONTEXT) ||
+           Fail("eglMakeCurrent(EGL_NO_CONTEXT)");
+}
+
+bool PbufferContext::DestroySurface() {
+    const EGLSurface surface = m_surface;
+    m_surface = EGL_NO_SURFACE;
+    return surface == EGL_NO_SURFACE || eglDestroySurface(m_display, surface) ||
+           Fail("eglDestroySurface");
+}
+
+bool PbufferContext::DestroyContext() {
+    const EGLContext context = m_context;
+    m_context = EGL_NO_CONTEXT;
+    return context == EGL_NO_CONTEXT || eglDestroyContext(m_display, context) ||
+           Fail("eglDestroyContext");
+}
+
+bool PbufferContext::Terminate() {
+    const EGLDisplay display = m_display;
+    m_display = EGL_NO_DISPLAY;
+    m_surface = EGL_NO_SURFACE;
+    m_context = EGL_NO_CONTEXT;
+    return eglTerminate(display) || Fail("eglTerminate");
 }
 
 bool PbufferContext::SwapBuffers() {
@@ -95,21 +138,14 @@ bool PbufferContext::SwapBuffers() {
 
 bool PbufferContext::Destroy() {
     if (m_display == EGL_NO_DISPLAY) return true;
-    bool ok = true;
-    if (!eglMakeCurrent(m_display, EGL_NO_SURFACE, EGL_NO_SURFACE, EGL_NO_CONTEXT)) {
-        ok = Fail("eglMakeCurrent(EGL_NO_CONTEXT)");
+    bool ok = ReleaseCurrent();
+    ok = DestroyContext() && ok;
+    ok = DestroySurface() && ok;
+    if (m_display_borrowed) {
+        m_display = EGL_NO_DISPLAY;
+        return ok;
     }
-    if (m_context != EGL_NO_CONTEXT && !eglDestroyContext(m_display, m_context)) {
-        ok = Fail("eglDestroyContext");
-    }
-    if (m_surface != EGL_NO_SURFACE && !eglDestroySurface(m_display, m_surface)) {
-        ok = Fail("eglDestroySurface");
-    }
-    if (!eglTerminate(m_display)) ok = Fail("eglTerminate");
-    m_context = EGL_NO_CONTEXT;
-    m_surface = EGL_NO_SURFACE;
-    m_display = EGL_NO_DISPLAY;
-    return ok;
+    return Terminate() && ok;
 }
 
 }  // namespace ovo_sample

@@ -16,16 +16,15 @@ bool EnoughProcessorTime(double seconds) {
     return static_cast<double>(std::clock()) >= seconds * CLOCKS_PER_SEC;
 }
 
-// Draws frames with a swap after each, at least `args.m_frames` and until the processor
-// time asked for is used. The last frame is read before its swap, as a game's screenshot
-// is: after a swap a window's back buffer holds nothing defined.
+}  // namespace
+
 bool DrawFrames(const char* program, const SampleArgs& args, SampleScene* scene,
                 PbufferContext* context, std::vector<uint8_t>* last_frame) {
     const PixelSize size = args.m_size;
     for (int32_t frame = 0;; ++frame) {
         scene->DrawFrame(frame);
         const bool last = frame + 1 >= args.m_frames && EnoughProcessorTime(args.m_cpu_seconds);
-        if (last) *last_frame = ReadFrame(size.m_width, size.m_height);
+        if (last && last_frame != nullptr) *last_frame = ReadFrame(size.m_width, size.m_height);
         if (!context->SwapBuffers()) return false;
         if (last) break;
     }
@@ -37,7 +36,14 @@ bool DrawFrames(const char* program, const SampleArgs& args, SampleScene* scene,
     return true;
 }
 
-}  // namespace
+bool WriteFrame(const char* program, const SampleArgs& args, const std::vector<uint8_t>& pixels) {
+    if (!WritePng(args.m_output, args.m_size.m_width, args.m_size.m_height, pixels.data())) {
+        std::fprintf(stderr, "%s: cannot write %s\n", program, args.m_output);
+        return false;
+    }
+    std::printf("%s: wrote %s\n", program, args.m_output);
+    return true;
+}
 
 int RunSample(const SampleInfo& info, SampleScene* scene, int argc, char** argv) {
     SampleArgs args;
@@ -45,7 +51,9 @@ int RunSample(const SampleInfo& info, SampleScene* scene, int argc, char** argv)
     return RunSample(info, args, scene);
 }
 
-int RunSample(const SampleInfo& info, const SampleArgs& args, SampleScene* scene) {
+int RunSample(const SampleInfo& info, const SampleArgs& start_args, SampleScene* scene,
+              SampleLife life) {
+    SampleArgs args = start_args;
     const PixelSize size = args.m_size;
     // A converter that interleaves the eyes asks every config for a stencil buffer, and on
     // Mesa those configs hold 24 bits of depth instead of 16: one eye of the pair is rendered
@@ -63,16 +71,12 @@ int RunSample(const SampleInfo& info, const SampleArgs& args, SampleScene* scene
         return SAMPLE_EXIT_FAILED;
     }
     std::vector<uint8_t> pixels;
-    bool ok = DrawFrames(info.m_program, args, scene, &context, &pixels);
+    bool ok = life == nullptr || (DrawFrames(info.m_program, args, scene, &context, nullptr) &&
+                                  life(info, &context, scene, &args));
+    ok = ok && DrawFrames(info.m_program, args, scene, &context, &pixels);
     scene->Release();
     ok = context.Destroy() && ok;
-    if (!ok) return SAMPLE_EXIT_FAILED;
-
-    if (!WritePng(args.m_output, size.m_width, size.m_height, pixels.data())) {
-        std::fprintf(stderr, "%s: cannot write %s\n", info.m_program, args.m_output);
-        return SAMPLE_EXIT_FAILED;
-    }
-    std::printf("%s: wrote %s\n", info.m_program, args.m_output);
+    if (!ok || !WriteFrame(info.m_program, args, pixels)) return SAMPLE_EXIT_FAILED;
     return 0;
 }
 

@@ -67,6 +67,8 @@ void Es1Scene::Release() {
     DeleteTexture(&m_crate_texture);
 }
 
+void Es1Scene::UseCrateTexture(uint32_t texture) { ReplaceTexture(&m_crate_texture, texture); }
+
 void Es1Scene::BuildFloor() {
     const GLfloat origin = -FLOOR_TILES * FLOOR_TILE_SIZE * 0.5f;
     for (int32_t row = 0; row < FLOOR_TILES; ++row) {

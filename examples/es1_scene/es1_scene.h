@@ -26,6 +26,11 @@ public:
     void DrawFrame(int32_t frame) override;
     void Release() override;
 
+    // Draws the textured crate with `texture` from now on (made elsewhere: a loading
+    // thread's) and owns it: the crate's texture before it is deleted now, this one at
+    // Release.
+    void UseCrateTexture(uint32_t texture);
+
 private:
     struct FloorVertex {
         GLfloat m_position[3];

@@ -128,7 +128,10 @@ void Es2Scene::Release() {
     m_monitor.Delete();
     DeleteSceneMeshes(&m_meshes);
     DeleteScenePrograms(&m_programs);
+    m_eye_shift.ForgetPrograms();
 }
+
+void Es2Scene::UseFloorTexture(uint32_t texture) { ReplaceTexture(&m_floor_texture, texture); }
 
 void Es2Scene::DrawFrame(int32_t frame) {
     DrawMonitorPicture(frame);

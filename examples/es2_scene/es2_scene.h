@@ -25,6 +25,10 @@ public:
     void DrawFrame(int32_t frame) override;
     void Release() override;
 
+    // Draws the floor with `texture` from now on (made elsewhere: a loading thread's) and
+    // owns it: the floor's texture before it is deleted now, this one at Release.
+    void UseFloorTexture(uint32_t texture);
+
 private:
     void DrawMonitorPicture(int32_t frame);
     void DrawWorld(int32_t frame);

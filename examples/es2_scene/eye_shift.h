@@ -28,6 +28,10 @@ public:
     // value, since each pair of window draws ends with eye 1, or 0 before any.
     void SetForCurrentProgram();
 
+    // The game deleted its programs, and with them their uniforms' values; a name that
+    // comes again belongs to a new program.
+    void ForgetPrograms() { m_window_programs.clear(); }
+
 private:
     ReferenceOptions m_reference;
     // Programs that have drawn into the window.

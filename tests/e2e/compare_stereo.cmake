@@ -4,6 +4,10 @@
 # without interleaving, the single reference image).
 #   PROFILE_TOOL PROFILE ROOT LIBRARY_DIR OVO_PROGRAM MESA_PROGRAM FRAMES_TOOL OUTPUT
 #   PROCESS_NAME (optional)  RUN_ARGS  EYE_ARGS (;-lists)  EYE0_COLUMNS (even|odd, or empty)
+#   INTERLEAVE_ARGS (optional ;-list): more options of `ovo-frames interleave`
+#   LIVE_AT_EXIT (optional): the library's vendor GLES is the object-counting stand-in; its
+#     report at the program's end must have seen objects made and count exactly these live,
+#     e.g. "programs 0 shaders 0 textures 0 framebuffers 0 renderbuffers 0 buffers 0"
 set(ENV{EGL_PLATFORM} surfaceless)
 file(REMOVE_RECURSE "${OUTPUT}")
 file(MAKE_DIRECTORY "${OUTPUT}" "${ROOT}/sdcard/stereoconv/game")
@@ -24,11 +28,29 @@ if(PROCESS_NAME)
 endif()
 set(ENV{LD_LIBRARY_PATH} "${LIBRARY_DIR}")
 set(ENV{OVO_SWAP_CAPTURE} "${OUTPUT}/raw.png")
+if(DEFINED LIVE_AT_EXIT)
+  set(ENV{OVO_GL_COUNT} "${OUTPUT}/objects.count")
+endif()
 run(${launcher} "${OVO_PROGRAM}" "${OUTPUT}/own.png" ${RUN_ARGS})
 unset(ENV{LD_LIBRARY_PATH})
 unset(ENV{OVO_SWAP_CAPTURE})
+unset(ENV{OVO_GL_COUNT})
 if(EXISTS "${ROOT}/sdcard/stereoconv/game/stereo_gm.ovo")
   message(FATAL_ERROR "the library did not take the profile (the file is still there)")
+endif()
+# What is wrong, reported together at the end.
+set(problems "")
+if(DEFINED LIVE_AT_EXIT)
+  set(report "")
+  if(EXISTS "${OUTPUT}/objects.count")
+    file(STRINGS "${OUTPUT}/objects.count" report REGEX "^exit ")
+  endif()
+  if(NOT report MATCHES "^exit made ([0-9]+) rss_kb -?[0-9]+ (.*)$" OR CMAKE_MATCH_1 EQUAL 0)
+    string(APPEND problems "the counting stand-in saw no GL object made: '${report}'\n")
+  elseif(NOT CMAKE_MATCH_2 STREQUAL LIVE_AT_EXIT)
+    string(APPEND problems "GL objects live at the end: '${CMAKE_MATCH_2}', expected "
+      "'${LIVE_AT_EXIT}' (${OUTPUT}/objects.count)\n")
+  endif()
 endif()
 
 if(EYE0_COLUMNS)
@@ -36,7 +58,7 @@ if(EYE0_COLUMNS)
     run("${MESA_PROGRAM}" "${OUTPUT}/eye${eye}.png" ${RUN_ARGS} --eye ${eye} ${EYE_ARGS})
   endforeach()
   run("${FRAMES_TOOL}" interleave "${OUTPUT}/eye0.png" "${OUTPUT}/eye1.png"
-    --eye0-columns ${EYE0_COLUMNS} -o "${OUTPUT}/expected.png")
+    --eye0-columns ${EYE0_COLUMNS} ${INTERLEAVE_ARGS} -o "${OUTPUT}/expected.png")
 else()
   run("${MESA_PROGRAM}" "${OUTPUT}/expected.png" ${RUN_ARGS} ${EYE_ARGS})
 endif()
@@ -44,6 +66,10 @@ endif()
 execute_process(COMMAND "${FRAMES_TOOL}" compare "${OUTPUT}/raw.png" "${OUTPUT}/expected.png"
   RESULT_VARIABLE differ OUTPUT_VARIABLE out ERROR_VARIABLE err)
 if(NOT differ EQUAL 0)
-  message(FATAL_ERROR "the stereo frame differs from the expected one (${OUTPUT}):\n${out}${err}")
+  string(APPEND problems
+    "the stereo frame differs from the expected one (${OUTPUT}):\n${out}${err}")
+endif()
+if(problems)
+  message(FATAL_ERROR "${problems}")
 endif()
 message(STATUS "identical: ${OUTPUT}/raw.png ${OUTPUT}/expected.png")

@@ -14,18 +14,7 @@
 
 namespace {
 
-class ApplicationErrorsOnMesa : public ::testing::Test {
-protected:
-    void SetUp() override {
-        ASSERT_NO_FATAL_FAILURE(m_session.Open(2));
-        m_surface = m_session.CreateSurface(16, 16);
-        m_context = m_session.CreateContext();
-    }
-
-    MesaSession m_session;
-    EGLSurface m_surface = EGL_NO_SURFACE;
-    EGLContext m_context = EGL_NO_CONTEXT;
-};
+using ApplicationErrorsOnMesa = MesaSessionTest;
 
 // A context made current without a surface: nothing to take a size from, and no error.
 TEST_F(ApplicationErrorsOnMesa, MakingAContextCurrentWithoutASurfaceLeavesSuccess) {

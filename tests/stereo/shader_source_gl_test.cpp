@@ -64,12 +64,10 @@ GLuint VertexShader(const char* source) {
     return shader;
 }
 
-class ShaderSourceOnMesa : public ::testing::Test {
+class ShaderSourceOnMesa : public MesaSessionTest {
 protected:
     void SetUp() override {
-        ASSERT_NO_FATAL_FAILURE(m_session.Open(2));
-        m_surface = m_session.CreateSurface(16, 16);
-        m_context = m_session.CreateContext();
+        ASSERT_NO_FATAL_FAILURE(MesaSessionTest::SetUp());
         ASSERT_TRUE(MakeCurrent(m_context));
         // No profile here: the rewriting layer is put in by hand.
         ovo::StereoManager& manager = ovo::StereoManager::instance();
@@ -82,10 +80,6 @@ protected:
     }
 
     static size_t KeptCount() { return ovo::StereoManager::instance().m_shader_sources->Count(); }
-
-    MesaSession m_session;
-    EGLSurface m_surface = EGL_NO_SURFACE;
-    EGLContext m_context = EGL_NO_CONTEXT;
 };
 
 // Each set of strings goes once through the library and once straight to Mesa: every

@@ -36,6 +36,20 @@ struct MesaSession {
     }
 };
 
+// Tests on an OpenGL ES 2.0 session with a 16 x 16 pbuffer and a context, neither current.
+class MesaSessionTest : public ::testing::Test {
+protected:
+    void SetUp() override {
+        ASSERT_NO_FATAL_FAILURE(m_session.Open(2));
+        m_surface = m_session.CreateSurface(16, 16);
+        m_context = m_session.CreateContext();
+    }
+
+    MesaSession m_session;
+    EGLSurface m_surface = EGL_NO_SURFACE;
+    EGLContext m_context = EGL_NO_CONTEXT;
+};
+
 // Makes an OpenGL ES context of `client_version` current on a pbuffer of Mesa's surfaceless
 // platform, reached through the library, with 8 bits of red and of stencil. Call it under
 // ASSERT_NO_FATAL_FAILURE.

@@ -65,6 +65,28 @@ TEST(ColumnOps, InterleaveTakesEye0sColumnsOfItsParityAndEye1sOthers) {
     }
 }
 
+// The mask's area counts from the window's lower-left corner, the frame's rows from the top;
+// an area larger than the frame covers all of it.
+TEST(ColumnOps, OutsideTheMaskAreaOnlyTheOutsideEyeShows) {
+    const RgbaFrame eye0 = FromLetters({"abcde", "fghij", "klmno"});
+    const RgbaFrame eye1 = FromLetters({"ABCDE", "FGHIJ", "KLMNO"});
+    const struct {
+        const char* m_label;
+        ovo_frames::MaskArea m_area;
+        Rows m_expected;
+    } cases[] = {
+        {"lower rows, eye 0 outside", {5, 2, 0}, {"abcde", "fGhIj", "kLmNo"}},
+        {"left columns, eye 1 outside", {3, 3, 1}, {"aBcDE", "fGhIJ", "kLmNO"}},
+        {"corner, eye 0 outside", {2, 1, 0}, {"abcde", "fghij", "kLmno"}},
+        {"larger than the frame", {8, 6, 1}, {"aBcDe", "fGhIj", "kLmNo"}},
+    };
+    for (const auto& test : cases) {
+        SCOPED_TRACE(test.m_label);
+        EXPECT_EQ(ToLetters(ovo_frames::Interleave(eye0, eye1, COLUMN_PARITY_EVEN, &test.m_area)),
+                  test.m_expected);
+    }
+}
+
 TEST(ColumnOps, PreviewPutsEachEyeAtFullWidthEye0OnTheLeft) {
     const RgbaFrame raw = FromLetters({"aBcDeF", "gHiJkL"});
     const struct {

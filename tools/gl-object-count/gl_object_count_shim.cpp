@@ -13,6 +13,11 @@
 // Every COUNT_REPORT_EVERY-th eglSwapBuffers appends one line to the file named by
 // OVO_GL_COUNT:
 //   swap N rss_kb K programs P shaders S textures T framebuffers F renderbuffers R buffers B
+// and so does the end of the process, after everything else has run, with the number of
+// names ever made (of all kinds) in front:
+//   exit made M rss_kb K programs P ...
+// As the GLES libraries alone it counts too (without the swap's wait and its lines): a
+// copy of the library whose vendor EGL is another stand-in has it as its GLES vendor.
 #include <EGL/egl.h>
 #include <GLES2/gl2.h>
 #include <dlfcn.h>
@@ -37,10 +42,12 @@ constexpr char COUNT_FILE_VARIABLE[] = "OVO_GL_COUNT";
 // Late enough that the start-up frames have made what a game keeps.
 constexpr unsigned long COUNT_REPORT_EVERY = 500;
 constexpr size_t COUNT_LINE_CAPACITY = 512;
+constexpr size_t COUNT_EVENT_CAPACITY = 32;
 
+// Never destroyed: the report at exit reads it after the static destructors have run.
 LiveObjects& Objects() {
-    static LiveObjects objects;
-    return objects;
+    static LiveObjects* const objects = new LiveObjects();
+    return *objects;
 }
 
 void* MesaEgl() {
@@ -73,9 +80,10 @@ Function Mesa(const char* name) {
     return reinterpret_cast<Function>(MesaFunction(name));
 }
 
-// The report line for `swap`, ending in a newline; its length, or 0 when it does not fit.
-size_t FormatReport(unsigned long swap, char* line, size_t capacity) {
-    int length = std::snprintf(line, capacity, "swap %lu rss_kb %ld", swap,
+// The report line that starts with `event`, ending in a newline; its length, or 0 when it
+// does not fit.
+size_t FormatReport(const char* event, char* line, size_t capacity) {
+    int length = std::snprintf(line, capacity, "%s rss_kb %ld", event,
                                ovo_gl_count::ResidentKilobytes());
     for (size_t kind = 0; kind < ovo_gl_count::OBJECT_KIND_COUNT; ++kind) {
         if (length < 0 || static_cast<size_t>(length) >= capacity) return 0;
@@ -90,9 +98,9 @@ size_t FormatReport(unsigned long swap, char* line, size_t capacity) {
     return static_cast<size_t>(length);
 }
 
-void AppendReport(const char* path, unsigned long swap) {
+void AppendReport(const char* path, const char* event) {
     char line[COUNT_LINE_CAPACITY];
-    const size_t length = FormatReport(swap, line, sizeof(line));
+    const size_t length = FormatReport(event, line, sizeof(line));
     const int file = open(path, O_WRONLY | O_CREAT | O_APPEND | O_CLOEXEC, 0644);
     const bool written = length > 0 && file >= 0 &&
                          write(file, line, length) == static_cast<ssize_t>(length);
@@ -102,6 +110,15 @@ void AppendReport(const char* path, unsigned long swap) {
         std::fprintf(stderr, "gl-object-count: cannot write %s\n", path);
         warned = true;
     }
+}
+
+// Run as the process ends, once every exit handler (the GLES library's among them) is done.
+__attribute__((destructor)) void ReportAtExit() {
+    const char* path = std::getenv(COUNT_FILE_VARIABLE);
+    if (path == nullptr || path[0] == '\0') return;
+    char event[COUNT_EVENT_CAPACITY];
+    std::snprintf(event, sizeof(event), "exit made %zu", Objects().Made());
+    AppendReport(path, event);
 }
 
 }  // namespace
@@ -117,7 +134,9 @@ GL_COUNT_EXPORT EGLBoolean EGLAPIENTRY eglSwapBuffers(EGLDisplay display, EGLSur
     const unsigned long swap = ++swaps;
     const char* path = std::getenv(COUNT_FILE_VARIABLE);
     if (path != nullptr && path[0] != '\0' && swap % COUNT_REPORT_EVERY == 0) {
-        AppendReport(path, swap);
+        char event[COUNT_EVENT_CAPACITY];
+        std::snprintf(event, sizeof(event), "swap %lu", swap);
+        AppendReport(path, event);
     }
     return swapped;
 }

@@ -23,9 +23,12 @@ public:
     void Add(ObjectKind kind, int32_t count, const uint32_t* names);
     void Remove(ObjectKind kind, int32_t count, const uint32_t* names);
     size_t Count(ObjectKind kind) const;
+    // Names of any kind added since the start: none means the calls never came here.
+    size_t Made() const;
 
 private:
     mutable std::mutex m_mutex;
+    size_t m_made = 0;
     std::unordered_set<uint32_t> m_names[OBJECT_KIND_COUNT];
 };
 

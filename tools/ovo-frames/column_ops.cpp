@@ -22,11 +22,18 @@ ColumnParity Other(ColumnParity parity) {
 
 }  // namespace
 
-RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity eye0_columns) {
+RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity eye0_columns,
+                     const MaskArea* area) {
     RgbaFrame out(eye0.m_width, eye0.m_height);
+    const MaskArea whole = {out.m_width, out.m_height, 0};
+    if (area == nullptr) area = &whole;
+    const RgbaFrame& outside = area->m_outside_eye == 0 ? eye0 : eye1;
     for (int32_t y = 0; y < out.m_height; ++y) {
+        // Frame rows go top first, window rows bottom first.
+        const bool row_masked = out.m_height - 1 - y < area->m_height;
         for (int32_t x = 0; x < out.m_width; ++x) {
-            const RgbaFrame& eye = x % 2 == eye0_columns ? eye0 : eye1;
+            const bool masked = row_masked && x < area->m_width;
+            const RgbaFrame& eye = !masked ? outside : x % 2 == eye0_columns ? eye0 : eye1;
             std::memcpy(out.At(x, y), eye.At(x, y), FRAME_PIXEL_BYTES);
         }
     }

@@ -12,9 +12,21 @@ enum ColumnParity : int32_t {
     COLUMN_PARITY_ODD = 1,
 };
 
+// Where the column mask reaches in a window: its lower-left m_width x m_height pixels
+// (a mask drawn for a target smaller than the window, or of the other orientation).
+// Outside it the stencil keeps the value it was cleared to, and only `m_outside_eye`
+// (0 or 1) draws there.
+struct MaskArea {
+    int32_t m_width;
+    int32_t m_height;
+    int32_t m_outside_eye;
+};
+
 // The frame the panel receives: eye 0's pixels on the columns of `eye0_columns`, eye 1's on
-// the others. Both eyes have the same size.
-RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity eye0_columns);
+// the others; outside `area` (when given) only its outside eye's. Both eyes have the same
+// size.
+RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity eye0_columns,
+                     const MaskArea* area = nullptr);
 
 // The columns of one parity of `frame` (even width), side by side: (W / 2) x H. Of an
 // interleaved frame that is one eye's image in its own pixels ("eye pixels").

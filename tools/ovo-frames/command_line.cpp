@@ -8,7 +8,8 @@
 namespace ovo_frames_tool {
 
 const char USAGE[] =
-    "usage: ovo-frames interleave EYE0.png EYE1.png --eye0-columns even|odd -o OUT.png\n"
+    "usage: ovo-frames interleave EYE0.png EYE1.png --eye0-columns even|odd\n"
+    "                  [--mask-area WxH --outside-eye 0|1] -o OUT.png\n"
     "       ovo-frames preview RAW.png --eye0-columns even|odd -o OUT.png\n"
     "       ovo-frames anaglyph RAW.png --eye0-columns even|odd -o OUT.png\n"
     "       ovo-frames compare A.png B.png [--tolerance N]\n"
@@ -19,6 +20,8 @@ const char USAGE[] =
     "\n"
     "interleave  the frame the panel receives: the columns of one parity (0, 2, 4, ... are\n"
     "            even) from eye 0's image, the others from eye 1's image of the same size.\n"
+    "            With a mask area, only its lower-left W x H pixels are interleaved (the\n"
+    "            mask's reach) and the rest comes from the outside eye's image.\n"
     "preview     the two eyes of an interleaved frame side by side, eye 0 on the left, each\n"
     "            at full width (its columns doubled): 2W x H.\n"
     "anaglyph    red-cyan anaglyph of an interleaved frame: red from eye 0 (left), green\n"
@@ -62,6 +65,8 @@ const Option OPTIONS[] = {
     {"--budget-near", &Arguments::m_budget_near, OPTION_BUDGET, "--budget-near P"},
     {"--budget-far", &Arguments::m_budget_far, OPTION_BUDGET, "--budget-far P"},
     {"--bands", &Arguments::m_bands, OPTION_BANDS, "--bands N"},
+    {"--mask-area", &Arguments::m_mask_area, OPTION_MASK_AREA, "--mask-area WxH"},
+    {"--outside-eye", &Arguments::m_outside_eye, OPTION_MASK_AREA, "--outside-eye 0|1"},
 };
 
 // The option of `command` that `argument` names, as "NAME" or "NAME=VALUE" (then `value`
@@ -132,6 +137,26 @@ bool ParseWholeNumber(const char* option, const char* text, long lowest, long hi
         return false;
     }
     *value = static_cast<int32_t>(number);
+    return true;
+}
+
+bool ParseSize(const char* option, const char* text, long largest, int32_t* width, int32_t* height) {
+    if (text == nullptr) return true;
+    long sides[2] = {0, 0};
+    const char* at = text;
+    for (int side = 0; side < 2; ++side) {
+        char* end = nullptr;
+        errno = 0;
+        if (*at >= '0' && *at <= '9') sides[side] = std::strtol(at, &end, 10);
+        if (end == nullptr || errno != 0 || sides[side] < 1 || sides[side] > largest ||
+            *end != (side == 0 ? 'x' : '\0')) {
+            UsageError(option, std::string("'") + text + "' is not WxH");
+            return false;
+        }
+        at = end + 1;
+    }
+    *width = static_cast<int32_t>(sides[0]);
+    *height = static_cast<int32_t>(sides[1]);
     return true;
 }
 

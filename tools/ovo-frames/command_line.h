@@ -29,6 +29,8 @@ struct Arguments {
     const char* m_budget_near = nullptr;
     const char* m_budget_far = nullptr;
     const char* m_bands = nullptr;
+    const char* m_mask_area = nullptr;
+    const char* m_outside_eye = nullptr;
 };
 
 // Which options a command offers or needs.
@@ -40,6 +42,7 @@ enum OptionSet : uint32_t {
     OPTION_MAP = 1u << 4,
     OPTION_BUDGET = 1u << 5,  // --budget-near, --budget-far
     OPTION_BANDS = 1u << 6,
+    OPTION_MASK_AREA = 1u << 7,  // --mask-area, --outside-eye
 };
 
 struct Command {
@@ -62,6 +65,8 @@ int ParseArguments(const Command& command, int argc, char** argv, Arguments* arg
 // A whole number from `lowest` to `highest` in `text` (left as it is when `text` is null);
 // false, after a usage error naming `option`, when it is not one.
 bool ParseWholeNumber(const char* option, const char* text, long lowest, long highest, int32_t* value);
+// "WxH", each side a whole number from 1 to `largest`, likewise.
+bool ParseSize(const char* option, const char* text, long largest, int32_t* width, int32_t* height);
 // A percentage above 0 and at most 100, likewise.
 bool ParsePercent(const char* option, const char* text, float* value);
 

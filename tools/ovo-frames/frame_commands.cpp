@@ -22,13 +22,35 @@ std::string PixelText(const RgbaFrame& frame, int32_t x, int32_t y) {
 
 }  // namespace
 
+// As large as the samples' pbuffers go.
+constexpr long FRAME_SIDE_MAX = 8192;
+
+// The mask area of the command line, or null without one; false after a usage error.
+bool ReadMaskArea(const Arguments& arguments, ovo_frames::MaskArea* area, const ovo_frames::MaskArea** chosen) {
+    *chosen = nullptr;
+    if (arguments.m_mask_area == nullptr && arguments.m_outside_eye == nullptr) return true;
+    if (arguments.m_mask_area == nullptr || arguments.m_outside_eye == nullptr) {
+        UsageError("--mask-area", "goes with --outside-eye");
+        return false;
+    }
+    if (!ParseSize("--mask-area", arguments.m_mask_area, FRAME_SIDE_MAX, &area->m_width, &area->m_height) ||
+        !ParseWholeNumber("--outside-eye", arguments.m_outside_eye, 0, 1, &area->m_outside_eye)) {
+        return false;
+    }
+    *chosen = area;
+    return true;
+}
+
 int RunInterleave(const Arguments& arguments) {
+    ovo_frames::MaskArea area = {};
+    const ovo_frames::MaskArea* mask_area = nullptr;
+    if (!ReadMaskArea(arguments, &area, &mask_area)) return EXIT_TROUBLE;
     RgbaFrame eye0;
     RgbaFrame eye1;
     if (!Load(arguments.m_files[0], &eye0) || !LoadSameSize(arguments.m_files[1], eye0, arguments.m_files[0], &eye1)) {
         return EXIT_TROUBLE;
     }
-    return Save(arguments.m_output, ovo_frames::Interleave(eye0, eye1, Eye0Columns(arguments)));
+    return Save(arguments.m_output, ovo_frames::Interleave(eye0, eye1, Eye0Columns(arguments), mask_area));
 }
 
 int RunPreview(const Arguments& arguments) {

@@ -14,7 +14,7 @@ constexpr uint32_t MAKES_FRAME = OPTION_OUTPUT | OPTION_EYE0_COLUMNS;
 constexpr uint32_t MEASURES = OPTION_EYE0_COLUMNS | OPTION_MATCHING;
 
 const Command COMMANDS[] = {
-    {"interleave", 2, MAKES_FRAME, MAKES_FRAME, RunInterleave},
+    {"interleave", 2, MAKES_FRAME | OPTION_MASK_AREA, MAKES_FRAME, RunInterleave},
     {"preview", 1, MAKES_FRAME, MAKES_FRAME, RunPreview},
     {"anaglyph", 1, MAKES_FRAME, MAKES_FRAME, RunAnaglyph},
     {"compare", 2, OPTION_TOLERANCE, 0, RunCompare},
