@@ -12,6 +12,9 @@ enum ColumnParity : int32_t {
     COLUMN_PARITY_ODD = 1,
 };
 
+// The other eye's columns.
+ColumnParity OtherParity(ColumnParity parity);
+
 // The frame the panel receives: eye 0's pixels on the columns of `eye0_columns`, eye 1's on
 // the others. Both eyes have the same size.
 RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity eye0_columns);
