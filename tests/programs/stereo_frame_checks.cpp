@@ -10,6 +10,7 @@
 #include "column_ops.h"
 #include "disparity_summary.h"
 #include "eye_compensation.h"
+#include "screen_disparity.h"
 
 namespace {
 
@@ -23,11 +24,8 @@ constexpr float SHIFT_TOLERANCE = 0.5f;
 constexpr float DEPTH_VISIBLE = 1.0f;
 // Bands of rows, each matched across the whole width.
 constexpr int32_t BAND_ROWS = 32;
-// Eye 1's columns lie one screen pixel right of eye 0's: content at the same place on the
-// screen shows half an eye pixel further left in eye 1's image.
-constexpr float EYE1_COLUMN_OFFSET = 0.5f;
-// Each eye, block by block moved back, against the native frame on the eye's own columns:
-// mean absolute difference per channel (0 to 255). What only moved sideways leaves a level
+// Each eye, block by block moved back, against the native frame at full resolution: mean
+// absolute difference per channel (0 to 255). What only moved sideways leaves a level
 // or two where edges fall between columns; a missing object, a black eye or a changed
 // colour leaves tens of levels over whole blocks. The high percentile leaves out the 5 % of
 // blocks at depth edges, which one image sees and the other does not.
@@ -71,14 +69,18 @@ void ExpectWithin(float shift, const ShiftSpan& span, const char* what) {
     EXPECT_LE(shift, span.m_highest + SHIFT_TOLERANCE) << what;
 }
 
-// One eye against the native frame on its columns: moved only sideways, and only as far
-// as the profile lets it.
+// One eye, shown on `columns`, against the native frame: moved only sideways, and only as
+// far as the profile lets it.
 ovo_frames::CompensationSummary ExpectEyeMatchesNative(const RgbaFrame& eye, const RgbaFrame& native,
-                                                       const ShiftSpan& span, const char* which) {
+                                                       ovo_frames::ColumnParity columns, const ShiftSpan& span,
+                                                       const char* which) {
     SCOPED_TRACE(which);
-    ovo_frames::CompensationSummary summary =
-        ovo_frames::MeasureCompensation(eye, native, ovo_frames::BlockMatchOptions());
-    for (const ovo_frames::ShiftEstimate& block : summary.m_shifts.m_blocks) {
+    // Shifts in screen pixels, as far as an eye pixel search would reach.
+    ovo_frames::BlockMatchOptions on_screen;
+    on_screen.m_max_shift *= ovo_frames::EYE_PIXEL_SCREEN_COLUMNS;
+    ovo_frames::CompensationSummary summary = ovo_frames::MeasureCompensation(eye, native, columns, on_screen);
+    for (ovo_frames::ShiftEstimate& block : summary.m_shifts.m_blocks) {
+        block.m_shift /= ovo_frames::EYE_PIXEL_SCREEN_COLUMNS;
         if (block.m_known) ExpectWithin(block.m_shift, span, "a block against the native frame");
     }
     EXPECT_LE(summary.m_residual_mean, RESIDUAL_MEAN_LIMIT);
@@ -123,15 +125,15 @@ void ExpectStereoFrame(const RgbaFrame& native, const RgbaFrame& stereo, SceneDe
     const ovo_frames::EyeImages eyes = ovo_frames::Deinterleave(stereo, ovo_frames::COLUMN_PARITY_EVEN);
 
     // The eyes against each other, band by band across the whole width.
-    for (const ovo_frames::ShiftEstimate& band :
-         ovo_frames::MatchBands(eyes.m_eye0, eyes.m_eye1, BAND_ROWS, ovo_frames::BlockMatchOptions())) {
-        if (band.m_known) ExpectWithin(band.m_shift + EYE1_COLUMN_OFFSET, prediction.m_disparity, "a band of rows");
+    for (const ovo_frames::ShiftEstimate& band : ovo_frames::MeasureScreenDisparityBands(
+             stereo, ovo_frames::COLUMN_PARITY_EVEN, BAND_ROWS, ovo_frames::BlockMatchOptions())) {
+        if (band.m_known) ExpectWithin(band.m_shift, prediction.m_disparity, "a band of rows");
     }
 
     const ovo_frames::CompensationSummary eye0 = ExpectEyeMatchesNative(
-        eyes.m_eye0, ovo_frames::ColumnsOf(native, ovo_frames::COLUMN_PARITY_EVEN), prediction.m_eyes[0], "eye 0");
+        eyes.m_eye0, native, ovo_frames::COLUMN_PARITY_EVEN, prediction.m_eyes[0], "eye 0");
     const ovo_frames::CompensationSummary eye1 = ExpectEyeMatchesNative(
-        eyes.m_eye1, ovo_frames::ColumnsOf(native, ovo_frames::COLUMN_PARITY_ODD), prediction.m_eyes[1], "eye 1");
+        eyes.m_eye1, native, ovo_frames::COLUMN_PARITY_ODD, prediction.m_eyes[1], "eye 1");
     const std::vector<float> disparities = Disparities(eye0, eye1);
     const float nearest = ovo_frames::PercentileOf(disparities, DISPARITY_OUTLIER_PERCENT);
     const float farthest = ovo_frames::PercentileOf(disparities, 100.0f - DISPARITY_OUTLIER_PERCENT);

@@ -190,7 +190,7 @@ const std::vector<ovo_test::Stripe> SCENE = {{16, 4.0f}, {16, -2.0f}, {16, 0.0f,
 constexpr int32_t SCENE_EYE_WIDTH = 160;
 
 TEST_F(FramesToolTest, DisparityPrintsTheRangeHistogramAndBudgetWarnings) {
-    Save("scene.png", ovo_test::InterleaveEyes(ovo_test::MakeEyes(SCENE_EYE_WIDTH, SCENE), ovo_frames::COLUMN_PARITY_ODD));
+    Save("scene.png", ovo_test::MakeStereoFrame(SCENE_EYE_WIDTH, SCENE, ovo_frames::COLUMN_PARITY_ODD));
     // 2 pixels of 160 are 1.25 % of the width, 4 are 2.5 %.
     const struct {
         std::vector<std::string> m_options;
@@ -231,7 +231,7 @@ TEST_F(FramesToolTest, DisparityPrintsTheRangeHistogramAndBudgetWarnings) {
 }
 
 TEST_F(FramesToolTest, DisparityOfAFlatFrameIsUnknownWithExit1) {
-    Save("flat.png", ovo_test::InterleaveEyes(ovo_test::MakeEyes(32, {{32, 1.0f, ovo_test::STRIPE_FLAT}}), ovo_frames::COLUMN_PARITY_EVEN));
+    Save("flat.png", ovo_test::MakeStereoFrame(32, {{32, 1.0f, ovo_test::STRIPE_FLAT}}, ovo_frames::COLUMN_PARITY_EVEN));
     const std::pair<int, std::string> result = Run({"disparity", "flat.png", "--eye0-columns", "even"});
     EXPECT_EQ(result.first, 1);
     const std::map<std::string, std::string> values = Values(result.second);
@@ -240,18 +240,18 @@ TEST_F(FramesToolTest, DisparityOfAFlatFrameIsUnknownWithExit1) {
     EXPECT_EQ(values.count("warning"), 0u);
 }
 
-TEST_F(FramesToolTest, MatchEyesFindsEachEyeHalfTheDisparityFromTheFlatFrame) {
-    Save("scene.png", ovo_test::InterleaveEyes(ovo_test::MakeEyes(SCENE_EYE_WIDTH, SCENE), ovo_frames::COLUMN_PARITY_EVEN));
-    std::vector<ovo_test::Stripe> flat = SCENE;
-    for (ovo_test::Stripe& stripe : flat) stripe.m_disparity = 0.0f;
-    Save("native.png", ovo_test::InterleaveEyes(ovo_test::MakeEyes(SCENE_EYE_WIDTH, flat), ovo_frames::COLUMN_PARITY_EVEN));
+TEST_F(FramesToolTest, MatchEyesFindsEachEyeMovedByTheDisparityInScreenPixels) {
+    Save("scene.png", ovo_test::MakeStereoFrame(SCENE_EYE_WIDTH, SCENE, ovo_frames::COLUMN_PARITY_EVEN));
+    Save("native.png", ovo_test::MakeFlatFrame(SCENE_EYE_WIDTH, SCENE));
     const std::pair<int, std::string> result = Run({"match-eyes", "scene.png", "native.png", "--eye0-columns", "even"});
     ASSERT_EQ(result.first, 0) << result.second;
     const std::map<std::string, std::string> values = Values(result.second);
-    EXPECT_NEAR(Number(values, "eye0.nearest_px"), -2.0f, 0.1f) << result.second;
-    EXPECT_NEAR(Number(values, "eye0.farthest_px"), 1.0f, 0.1f);
-    EXPECT_NEAR(Number(values, "eye1.nearest_px"), -1.0f, 0.1f);
-    EXPECT_NEAR(Number(values, "eye1.farthest_px"), 2.0f, 0.1f);
+    // Disparities of 4 and -2 eye pixels: eye 0 moves 4 screen pixels left and 2 right.
+    EXPECT_NEAR(Number(values, "eye0.nearest_screen_px"), -4.0f, 0.1f) << result.second;
+    EXPECT_NEAR(Number(values, "eye0.farthest_screen_px"), 2.0f, 0.1f);
+    EXPECT_NEAR(Number(values, "eye1.nearest_screen_px"), -2.0f, 0.1f);
+    EXPECT_NEAR(Number(values, "eye1.farthest_screen_px"), 4.0f, 0.1f);
+    EXPECT_NEAR(Number(values, "eye1.farthest_percent"), 4.0f * 100.0f / (2 * SCENE_EYE_WIDTH), 0.01f);
     for (const char* eye : {"eye0.", "eye1."}) {
         EXPECT_NEAR(Number(values, std::string(eye) + "unknown_fraction"), 1.0f / 3.0f, 0.001f);
         EXPECT_LT(Number(values, std::string(eye) + "residual_worst"), 1.0f);

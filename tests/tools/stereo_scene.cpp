@@ -1,7 +1,8 @@
 #include "stereo_scene.h"
 
 #include <cmath>
-#include <cstring>
+
+#include "screen_disparity.h"
 
 namespace ovo_test {
 
@@ -12,6 +13,10 @@ using ovo_frames::RgbaFrame;
 constexpr float NOISE_STEP = 2.0f;
 constexpr uint8_t FLAT_LEVEL = 90;
 constexpr int32_t BAR_PERIOD = 6;
+constexpr float LINE_GROUND_LEVEL = 190.0f;
+constexpr float LINE_LEVEL = 40.0f;
+// Of the lattice's 256 levels, those that make a screen column a line: about one in six.
+constexpr float LINE_SHARE = 256.0f / 6.0f;
 
 float LatticeLevel(int64_t index, int32_t y, int32_t channel) {
     uint64_t hash = static_cast<uint64_t>(index) * 0x9E3779B97F4A7C15ull ^ static_cast<uint64_t>(y) * 0xC2B2AE3D27D4EB4Full ^
@@ -22,20 +27,22 @@ float LatticeLevel(int64_t index, int32_t y, int32_t channel) {
     return static_cast<float>(hash & 0xFF);
 }
 
+// `x` in eye pixels.
 float Level(StripeContent content, float x, int32_t y, int32_t channel) {
-    if (content == STRIPE_FLAT) return FLAT_LEVEL;
-    if (content == STRIPE_BARS) return std::fmod(std::floor(x) + 1000.0f * BAR_PERIOD, BAR_PERIOD) < BAR_PERIOD / 2 ? 220.0f : 30.0f;
-    return NoiseAt(x, y, channel);
-}
-
-void Fill(RgbaFrame* eye, int32_t y, float offset, StripeContent content) {
-    for (int32_t x = 0; x < eye->m_width; ++x) {
-        uint8_t* pixel = eye->At(x, y);
-        for (int32_t channel = 0; channel < 3; ++channel) {
-            pixel[channel] = static_cast<uint8_t>(std::lround(Level(content, static_cast<float>(x) + offset, y, channel)));
+    switch (content) {
+        case STRIPE_FLAT:
+            return FLAT_LEVEL;
+        case STRIPE_BARS:
+            return std::fmod(std::floor(x) + 1000.0f * BAR_PERIOD, BAR_PERIOD) < BAR_PERIOD / 2 ? 220.0f : 30.0f;
+        case STRIPE_LINES: {
+            // The same columns on every row: vertical lines.
+            const auto screen_column = static_cast<int64_t>(std::floor(x * ovo_frames::EYE_PIXEL_SCREEN_COLUMNS));
+            return LatticeLevel(screen_column, 0, 0) < LINE_SHARE ? LINE_LEVEL : LINE_GROUND_LEVEL;
         }
-        pixel[3] = 255;
+        case STRIPE_NOISE:
+            break;
     }
+    return NoiseAt(x, y, channel);
 }
 
 }  // namespace
@@ -49,29 +56,30 @@ float NoiseAt(float x, int32_t y, int32_t channel) {
     return LatticeLevel(left, y, channel) * (1.0f - smooth) + LatticeLevel(left + 1, y, channel) * smooth;
 }
 
-ovo_frames::EyeImages MakeEyes(int32_t eye_width, const std::vector<Stripe>& stripes) {
+RgbaFrame MakeStereoFrame(int32_t eye_width, const std::vector<Stripe>& stripes, ovo_frames::ColumnParity eye0_columns) {
     int32_t height = 0;
     for (const Stripe& stripe : stripes) height += stripe.m_rows;
-    ovo_frames::EyeImages eyes = {RgbaFrame(eye_width, height), RgbaFrame(eye_width, height)};
+    RgbaFrame frame(eye_width * ovo_frames::EYE_PIXEL_SCREEN_COLUMNS, height);
     int32_t y = 0;
     for (const Stripe& stripe : stripes) {
         for (int32_t row = 0; row < stripe.m_rows; ++row, ++y) {
-            Fill(&eyes.m_eye0, y, stripe.m_disparity / 2.0f, stripe.m_content);
-            Fill(&eyes.m_eye1, y, -stripe.m_disparity / 2.0f, stripe.m_content);
+            for (int32_t x = 0; x < frame.m_width; ++x) {
+                const float half = (x % 2 == eye0_columns ? 0.5f : -0.5f) * stripe.m_disparity;
+                const float at = static_cast<float>(x) / ovo_frames::EYE_PIXEL_SCREEN_COLUMNS + half;
+                uint8_t* pixel = frame.At(x, y);
+                for (int32_t channel = 0; channel < 3; ++channel) {
+                    pixel[channel] = static_cast<uint8_t>(std::lround(Level(stripe.m_content, at, y, channel)));
+                }
+                pixel[3] = 255;
+            }
         }
     }
-    return eyes;
+    return frame;
 }
 
-RgbaFrame InterleaveEyes(const ovo_frames::EyeImages& eyes, ovo_frames::ColumnParity eye0_columns) {
-    RgbaFrame raw(eyes.m_eye0.m_width * 2, eyes.m_eye0.m_height);
-    for (int32_t y = 0; y < raw.m_height; ++y) {
-        for (int32_t x = 0; x < eyes.m_eye0.m_width; ++x) {
-            std::memcpy(raw.At(2 * x + eye0_columns, y), eyes.m_eye0.At(x, y), ovo_frames::FRAME_PIXEL_BYTES);
-            std::memcpy(raw.At(2 * x + 1 - eye0_columns, y), eyes.m_eye1.At(x, y), ovo_frames::FRAME_PIXEL_BYTES);
-        }
-    }
-    return raw;
+RgbaFrame MakeFlatFrame(int32_t eye_width, std::vector<Stripe> stripes) {
+    for (Stripe& stripe : stripes) stripe.m_disparity = 0.0f;
+    return MakeStereoFrame(eye_width, stripes, ovo_frames::COLUMN_PARITY_EVEN);
 }
 
 }  // namespace ovo_test

@@ -5,34 +5,41 @@
 
 #include "column_ops.h"
 
-// Stereo frames with a made disparity: bands of rows, each textured content at its own
-// depth or a flat colour.
+// Stereo frames with a made disparity on the screen: bands of rows, each textured content
+// at its own depth or a flat colour, drawn as a panel shows them (each eye on its own
+// screen columns).
 namespace ovo_test {
 
-// Random levels two pixels apart along each row, joined smoothly (smoothstep), so the
+// Random levels two eye pixels apart along each row, joined smoothly (smoothstep), so the
 // texture can be read between pixels: a made sub-pixel shift is exact.
 float NoiseAt(float x, int32_t y, int32_t channel);
 
 enum StripeContent {
     STRIPE_NOISE,
     STRIPE_FLAT,
-    // Vertical bars, three columns light and three dark: every sixth shift fits as well.
+    // Vertical bars, three eye pixels light and three dark: every sixth shift fits as well.
     STRIPE_BARS,
+    // Dark vertical lines one screen pixel wide on a light ground, at irregular screen
+    // columns of either parity, as a grid or text has them.
+    STRIPE_LINES,
 };
 
 struct Stripe {
     int32_t m_rows;
-    // x_eye1 - x_eye0 in eye pixels.
+    // x_eye1 - x_eye0 on the screen, in eye pixels (two screen pixels each).
     float m_disparity;
     StripeContent m_content = STRIPE_NOISE;
 };
 
-// A stripe's content lies at x + d/2 in eye 0 and x - d/2 in eye 1 (so that a point lies d
-// further right in eye 1), where d is the stripe's disparity.
-ovo_frames::EyeImages MakeEyes(int32_t eye_width, const std::vector<Stripe>& stripes);
+// The panel's frame, 2 x eye_width wide: screen column c shows the stripe's content at
+// c / 2 + d / 2 eye pixels when it is one of eye 0's columns, at c / 2 - d / 2 when it is
+// one of eye 1's, d the stripe's disparity. So each eye's content lies d screen pixels from
+// where the flat frame has it, eye 0's to the left.
+ovo_frames::RgbaFrame MakeStereoFrame(int32_t eye_width, const std::vector<Stripe>& stripes,
+                                      ovo_frames::ColumnParity eye0_columns);
 
-// The panel's frame: eye 0's pixel x on column 2x + eye0_columns, eye 1's beside it.
-ovo_frames::RgbaFrame InterleaveEyes(const ovo_frames::EyeImages& eyes, ovo_frames::ColumnParity eye0_columns);
+// The game's flat frame of the same stripes: every disparity 0.
+ovo_frames::RgbaFrame MakeFlatFrame(int32_t eye_width, std::vector<Stripe> stripes);
 
 }  // namespace ovo_test
 

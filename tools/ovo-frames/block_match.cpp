@@ -1,6 +1,7 @@
 #include "block_match.h"
 
 #include <algorithm>
+#include <cmath>
 #include <cstdlib>
 #include <limits>
 
@@ -9,41 +10,69 @@ namespace ovo_frames {
 namespace {
 
 constexpr int32_t RGB_CHANNELS = 3;
-// The cost of a shift that leaves too much of the region outside the other image.
-constexpr float COST_NOT_TRIED = -1.0f;
 
-struct Region {
-    int32_t m_x;
-    int32_t m_y;
-    int32_t m_width;
-    int32_t m_height;
-};
-
-int64_t RowDifference(const uint8_t* a, const uint8_t* b, int32_t pixels) {
+int64_t RowDifference(const uint8_t* a, const uint8_t* b, int32_t pixels, size_t b_step) {
     int64_t sum = 0;
-    for (int32_t i = 0; i < pixels; ++i, a += FRAME_PIXEL_BYTES, b += FRAME_PIXEL_BYTES) {
+    for (int32_t i = 0; i < pixels; ++i, a += FRAME_PIXEL_BYTES, b += b_step) {
         sum += std::abs(a[0] - b[0]) + std::abs(a[1] - b[1]) + std::abs(a[2] - b[2]);
     }
     return sum;
 }
 
-float PerChannel(int64_t sum, int32_t pixels) {
-    return static_cast<float>(static_cast<double>(sum) / (static_cast<double>(pixels) * RGB_CHANNELS));
-}
-
-float ShiftCost(const RgbaFrame& from, const RgbaFrame& to, const Region& region, int32_t shift) {
-    const int32_t first = std::max(region.m_x, -shift);
-    const int32_t end = std::min(region.m_x + region.m_width, to.m_width - shift);
-    const int32_t columns = end - first;
-    if (columns <= 0 || 2 * columns < region.m_width) return COST_NOT_TRIED;
-    int64_t sum = 0;
-    for (int32_t y = region.m_y; y < region.m_y + region.m_height; ++y) {
-        sum += RowDifference(from.At(first, y), to.At(first + shift, y), columns);
+// Against `b` read `fraction` of the way to the pixel after it.
+double RowDifferenceBetween(const uint8_t* a, const uint8_t* b, int32_t pixels, size_t b_step, float fraction) {
+    double sum = 0.0;
+    for (int32_t i = 0; i < pixels; ++i, a += FRAME_PIXEL_BYTES, b += b_step) {
+        for (int32_t channel = 0; channel < RGB_CHANNELS; ++channel) {
+            const float sample = (1.0f - fraction) * b[channel] + fraction * b[channel + FRAME_PIXEL_BYTES];
+            sum += std::fabs(a[channel] - sample);
+        }
     }
-    return PerChannel(sum, columns * region.m_height);
+    return sum;
 }
 
-bool Tried(const std::vector<float>& costs, size_t index) { return costs[index] != COST_NOT_TRIED; }
+// Rounds towards minus infinity; `divisor` is positive.
+int32_t FloorDivide(int32_t value, int32_t divisor) {
+    return value >= 0 ? value / divisor : -((-value + divisor - 1) / divisor);
+}
+
+int32_t CeilDivide(int32_t value, int32_t divisor) { return -FloorDivide(-value, divisor); }
+
+// The columns of `region` that land inside `to` at `shift`.
+ImageRegion InsidePart(const ImageRegion& region, const RgbaFrame& to, const ColumnMapping& columns, float shift) {
+    const auto whole = static_cast<int32_t>(std::floor(shift));
+    // Column x of the region meets column stride * x + offset of `to`, and the one after it
+    // when the shift has a fraction.
+    const int32_t offset = columns.m_phase + whole;
+    const int32_t last_column = to.m_width - 1 - (shift > static_cast<float>(whole) ? 1 : 0);
+    const int32_t first = std::max(region.m_x, CeilDivide(-offset, columns.m_stride));
+    const int32_t end = std::min(region.m_x + region.m_width, FloorDivide(last_column - offset, columns.m_stride) + 1);
+    return {first, region.m_y, std::max(end - first, 0), region.m_height};
+}
+
+}  // namespace
+
+float RegionCost(const RgbaFrame& from, const RgbaFrame& to, const ImageRegion& region, const ColumnMapping& columns,
+                 float shift) {
+    const ImageRegion inside = InsidePart(region, to, columns, shift);
+    if (inside.m_width == 0 || 2 * inside.m_width < region.m_width) return std::numeric_limits<float>::infinity();
+    const auto whole = static_cast<int32_t>(std::floor(shift));
+    const float fraction = shift - static_cast<float>(whole);
+    const size_t step = static_cast<size_t>(columns.m_stride) * FRAME_PIXEL_BYTES;
+    double sum = 0.0;
+    for (int32_t y = inside.m_y; y < inside.m_y + inside.m_height; ++y) {
+        const uint8_t* a = from.At(inside.m_x, y);
+        const uint8_t* b = to.At(columns.m_stride * inside.m_x + columns.m_phase + whole, y);
+        sum += fraction > 0.0f ? RowDifferenceBetween(a, b, inside.m_width, step, fraction)
+                               : static_cast<double>(RowDifference(a, b, inside.m_width, step));
+    }
+    return static_cast<float>(sum / (static_cast<double>(inside.m_width) * inside.m_height * RGB_CHANNELS));
+}
+
+namespace {
+
+// RegionCost is infinite for a shift that leaves too much of the region outside `to`.
+bool Tried(const std::vector<float>& costs, size_t index) { return std::isfinite(costs[index]); }
 
 // The lowest tried cost outside the valley around costs[best]: its two neighbours (at a
 // shift of a half pixel they cost about as much as the best) and on either side as far as
@@ -72,42 +101,73 @@ float VVertex(float before, float at, float after) {
     return std::clamp(0.5f * (before - after) / rise, -0.5f, 0.5f);
 }
 
-// `costs` is scratch space, kept between regions so that it is allocated once.
-ShiftEstimate MatchRegion(const RgbaFrame& from, const RgbaFrame& to, const Region& region,
-                          const BlockMatchOptions& options, std::vector<float>* costs) {
-    const auto zero = static_cast<size_t>(options.m_max_shift);
-    costs->resize(2 * zero + 1);
+// The cost of every whole shift from -max to +max for `region`, into `costs`.
+void CostsOfShifts(const RgbaFrame& from, const RgbaFrame& to, const ImageRegion& region,
+                   const BlockMatchOptions& options, std::vector<float>* costs) {
+    costs->resize(2 * static_cast<size_t>(options.m_max_shift) + 1);
     for (size_t index = 0; index < costs->size(); ++index) {
-        (*costs)[index] = ShiftCost(from, to, region, static_cast<int32_t>(index) - options.m_max_shift);
+        const auto shift = static_cast<float>(static_cast<int32_t>(index) - options.m_max_shift);
+        (*costs)[index] = RegionCost(from, to, region, options.m_to_columns, shift);
     }
-    // Shift 0 is always tried. Of equal costs the one nearest to it wins, so that flat
-    // content ends up ambiguous rather than at the end of the range.
+}
+
+// The index of the lowest cost. Shift 0 is always tried. Of equal costs the one nearest to
+// it wins, so that flat content ends up ambiguous rather than at the end of the range.
+size_t BestOf(const std::vector<float>& costs) {
+    const size_t zero = costs.size() / 2;
     size_t best = zero;
     for (size_t distance = 1; distance <= zero; ++distance) {
         for (const size_t index : {zero - distance, zero + distance}) {
-            if (Tried(*costs, index) && (*costs)[index] < (*costs)[best]) best = index;
+            if (Tried(costs, index) && costs[index] < costs[best]) best = index;
         }
     }
+    return best;
+}
+
+// Whether costs[best] stands out: not the last shift that could be tried (the true one may
+// lie beyond), and clearly below the runner-up.
+bool Distinct(const std::vector<float>& costs, size_t best, const BlockMatchOptions& options) {
+    if (best == 0 || best + 1 == costs.size() || !Tried(costs, best - 1) || !Tried(costs, best + 1)) return false;
+    const float runner_up = RunnerUp(costs, best);
+    return costs[best] <= options.m_max_runner_up_ratio * runner_up && runner_up - costs[best] >= options.m_min_margin;
+}
+
+// `costs` is scratch space, kept between regions so that it is allocated once.
+ShiftEstimate MatchRegion(const RgbaFrame& from, const RgbaFrame& to, const ImageRegion& region,
+                          const BlockMatchOptions& options, std::vector<float>* costs) {
+    CostsOfShifts(from, to, region, options, costs);
+    const size_t best = BestOf(*costs);
     ShiftEstimate estimate;
-    estimate.m_best_cost = (*costs)[best];
+    estimate.m_cost = (*costs)[best];
     estimate.m_shift = static_cast<float>(static_cast<int32_t>(best) - options.m_max_shift);
-    if (best == 0 || best + 1 == costs->size() || !Tried(*costs, best - 1) || !Tried(*costs, best + 1)) return estimate;
-    const float runner_up = RunnerUp(*costs, best);
-    if (estimate.m_best_cost > options.m_max_runner_up_ratio * runner_up ||
-        runner_up - estimate.m_best_cost < options.m_min_margin) {
-        return estimate;
+    if (!Distinct(*costs, best, options)) return estimate;
+    const float refined = estimate.m_shift + VVertex((*costs)[best - 1], estimate.m_cost, (*costs)[best + 1]);
+    // Where part of the region falls outside `to`, only that part was compared: a flat part
+    // matches any flat place. It must find about the same shift on its own (a true shift
+    // between two whole ones can tip to either).
+    const ImageRegion inside = InsidePart(region, to, options.m_to_columns, estimate.m_shift);
+    if (inside.m_width < region.m_width) {
+        CostsOfShifts(from, to, inside, options, costs);
+        const size_t part_best = BestOf(*costs);
+        if (std::max(part_best, best) - std::min(part_best, best) > 1 || !Distinct(*costs, part_best, options)) {
+            return estimate;
+        }
     }
-    estimate.m_shift += VVertex((*costs)[best - 1], estimate.m_best_cost, (*costs)[best + 1]);
     estimate.m_known = true;
+    const float refined_cost = RegionCost(from, to, region, options.m_to_columns, refined);
+    if (refined_cost < estimate.m_cost) {
+        estimate.m_shift = refined;
+        estimate.m_cost = refined_cost;
+    }
     return estimate;
 }
 
 bool CanMatch(const RgbaFrame& from, const RgbaFrame& to, const BlockMatchOptions& options) {
-    return from.m_width == to.m_width && from.m_height == to.m_height && from.m_width > 0 && from.m_height > 0 &&
-           options.m_max_shift >= 1;
+    const ColumnMapping& columns = options.m_to_columns;
+    return columns.m_stride >= 1 && columns.m_phase >= 0 && columns.m_phase < columns.m_stride &&
+           static_cast<int64_t>(from.m_width) * columns.m_stride == to.m_width && from.m_height == to.m_height &&
+           from.m_width > 0 && from.m_height > 0 && options.m_max_shift >= 1;
 }
-
-int32_t CeilDivide(int32_t value, int32_t divisor) { return (value + divisor - 1) / divisor; }
 
 }  // namespace
 
@@ -123,9 +183,7 @@ DisparityField MatchBlocks(const RgbaFrame& from, const RgbaFrame& to, const Blo
     std::vector<float> costs;
     for (int32_t row = 0; row < field.m_rows; ++row) {
         for (int32_t column = 0; column < field.m_columns; ++column) {
-            const Region block = {column * size, row * size, std::min(size, from.m_width - column * size),
-                                  std::min(size, from.m_height - row * size)};
-            field.m_blocks.push_back(MatchRegion(from, to, block, options, &costs));
+            field.m_blocks.push_back(MatchRegion(from, to, field.BlockAt(column, row), options, &costs));
         }
     }
     return field;
@@ -137,7 +195,7 @@ std::vector<ShiftEstimate> MatchBands(const RgbaFrame& from, const RgbaFrame& to
     if (!CanMatch(from, to, options) || band_rows < 1) return bands;
     std::vector<float> costs;
     for (int32_t y = 0; y < from.m_height; y += band_rows) {
-        const Region band = {0, y, from.m_width, std::min(band_rows, from.m_height - y)};
+        const ImageRegion band = {0, y, from.m_width, std::min(band_rows, from.m_height - y)};
         bands.push_back(MatchRegion(from, to, band, options, &costs));
     }
     return bands;

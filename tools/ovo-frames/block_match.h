@@ -1,22 +1,33 @@
 #ifndef OVO_TOOLS_OVO_FRAMES_BLOCK_MATCH_H
 #define OVO_TOOLS_OVO_FRAMES_BLOCK_MATCH_H
 
+#include <algorithm>
 #include <vector>
 
 #include "rgba_frame.h"
 
-// Horizontal block matching between two images of the same size: how far each part of one
-// image lies to the left or right in the other. Costs and levels are mean absolute
-// differences per colour channel (red, green, blue; 0 to 255); alpha is left out.
+// Horizontal block matching of one image against another: how far each part of one image
+// lies to the left or right in the other. Costs and levels are mean absolute differences
+// per colour channel (red, green, blue; 0 to 255); alpha is left out.
 namespace ovo_frames {
 
 constexpr int32_t BLOCK_MATCH_DEFAULT_BLOCK = 16;
 constexpr int32_t BLOCK_MATCH_DEFAULT_MAX_SHIFT = 32;
 
+// Where column x of the `from` image lies among the columns of the `to` image before any
+// shift: at m_stride * x + m_phase. {1, 0} compares two images of the same size; {2, p}
+// compares an eye's image with the full-resolution frame whose columns of parity p it was
+// shown on. `to` is m_stride times as wide as `from`, and 0 <= m_phase < m_stride.
+struct ColumnMapping {
+    int32_t m_stride = 1;
+    int32_t m_phase = 0;
+};
+
 struct BlockMatchOptions {
     int32_t m_block_size = BLOCK_MATCH_DEFAULT_BLOCK;
-    // Shifts from -m_max_shift to +m_max_shift are tried; at least 1.
+    // Shifts from -m_max_shift to +m_max_shift are tried, in columns of `to`; at least 1.
     int32_t m_max_shift = BLOCK_MATCH_DEFAULT_MAX_SHIFT;
+    ColumnMapping m_to_columns;
     // The best cost must stay at or below this fraction of the runner-up's (the lowest cost
     // outside the valley around the best) and below it by at least m_min_margin levels.
     // Otherwise the region is flat (every shift matches it about equally well) or a
@@ -26,18 +37,31 @@ struct BlockMatchOptions {
 };
 
 struct ShiftEstimate {
-    // False for a flat or ambiguous region, and when the best whole shift is the last one
-    // that could be tried (the true one may lie beyond): m_shift then means nothing.
+    // False for a flat or ambiguous region, when the best whole shift is the last one that
+    // could be tried (the true one may lie beyond), and when the best shift leaves part of
+    // the region outside `to` and the part inside, matched on its own, is flat, ambiguous
+    // or best more than a column away (a flat half matches any flat place): m_shift then
+    // means nothing.
     bool m_known = false;
-    // x_to - x_from in pixels, refined below a pixel from the costs of the best whole shift
-    // and its two neighbours.
+    // In columns of `to`: `from`'s column x matches `to` at m_stride * x + m_phase + m_shift
+    // (x_to - x_from for images of the same size). The best whole shift, refined below a
+    // column from its cost and its two neighbours' when the region is known and `to` read
+    // at the refined shift matches better (lines a pixel wide match at a whole shift only).
     float m_shift = 0.0f;
-    // The cost at the best whole shift.
-    float m_best_cost = 0.0f;
+    // RegionCost at m_shift.
+    float m_cost = 0.0f;
 };
 
-// Blocks tile the image from the top left; those on the right and bottom edges may be
-// smaller.
+// A rectangle of pixels of one image.
+struct ImageRegion {
+    int32_t m_x;
+    int32_t m_y;
+    int32_t m_width;
+    int32_t m_height;
+};
+
+// Blocks tile the `from` image from the top left; those on the right and bottom edges may
+// be smaller.
 struct DisparityField {
     int32_t m_block_size = 0;
     int32_t m_columns = 0;
@@ -50,14 +74,27 @@ struct DisparityField {
     const ShiftEstimate& At(int32_t column, int32_t row) const {
         return m_blocks[static_cast<size_t>(row) * static_cast<size_t>(m_columns) + static_cast<size_t>(column)];
     }
+
+    ImageRegion BlockAt(int32_t column, int32_t row) const {
+        return {column * m_block_size, row * m_block_size, std::min(m_block_size, m_image_width - column * m_block_size),
+                std::min(m_block_size, m_image_height - row * m_block_size)};
+    }
 };
 
-// For each block of `from`, the shift s (|s| <= max shift) for which `to` at x + s matches
-// `from` at x best, by the sum of absolute differences. Near the image's sides only the
-// shifts that keep at least half of the block's columns inside `to` are tried, over those
-// columns. With `from` eye 0 and `to` eye 1 the shift is the disparity x_eye1 - x_eye0.
-// Images of different sizes, or a block size or max shift below 1, give a field without
-// blocks.
+// The mean absolute difference per channel between `from` over `region` and `to` at each
+// column's mapped place plus `shift` (columns of `to`), read linearly between the two
+// nearest columns of `to` when the shift has a fraction. Only the columns that land inside
+// `to` count; infinite when fewer than half of the region's columns do.
+float RegionCost(const RgbaFrame& from, const RgbaFrame& to, const ImageRegion& region, const ColumnMapping& columns,
+                 float shift);
+
+// For each block of `from`, the whole shift s (|s| <= max shift) at which `to` matches it
+// best by RegionCost, then refined. Near the image's sides only the shifts that keep at
+// least half of the block's columns inside `to` are tried, over those columns. With `from`
+// eye 0, `to` eye 1 and the mapping {1, 0} the shift is x_eye1 - x_eye0 between the
+// de-interleaved images (see screen_disparity.h for the disparity on the screen). Heights
+// that differ, a width of `to` that the mapping does not give, or a block size or max shift
+// below 1 give a field without blocks.
 DisparityField MatchBlocks(const RgbaFrame& from, const RgbaFrame& to, const BlockMatchOptions& options);
 
 // The same for bands of `band_rows` rows (the last may be shorter) across the whole width,

@@ -16,11 +16,11 @@ const uint8_t* EyePixel(const RgbaFrame& raw, ColumnParity eye_columns, int32_t 
     return raw.At(x - x % 2 + eye_columns, y);
 }
 
-ColumnParity Other(ColumnParity parity) {
+}  // namespace
+
+ColumnParity OtherParity(ColumnParity parity) {
     return parity == COLUMN_PARITY_EVEN ? COLUMN_PARITY_ODD : COLUMN_PARITY_EVEN;
 }
-
-}  // namespace
 
 RgbaFrame Interleave(const RgbaFrame& eye0, const RgbaFrame& eye1, ColumnParity eye0_columns,
                      const MaskArea* area) {
@@ -49,7 +49,7 @@ RgbaFrame ColumnsOf(const RgbaFrame& frame, ColumnParity parity) {
 }
 
 EyeImages Deinterleave(const RgbaFrame& raw, ColumnParity eye0_columns) {
-    return {ColumnsOf(raw, eye0_columns), ColumnsOf(raw, Other(eye0_columns))};
+    return {ColumnsOf(raw, eye0_columns), ColumnsOf(raw, OtherParity(eye0_columns))};
 }
 
 RgbaFrame Preview(const RgbaFrame& raw, ColumnParity eye0_columns) {
@@ -57,7 +57,7 @@ RgbaFrame Preview(const RgbaFrame& raw, ColumnParity eye0_columns) {
     for (int32_t y = 0; y < raw.m_height; ++y) {
         for (int32_t x = 0; x < raw.m_width; ++x) {
             std::memcpy(out.At(x, y), EyePixel(raw, eye0_columns, x, y), FRAME_PIXEL_BYTES);
-            std::memcpy(out.At(raw.m_width + x, y), EyePixel(raw, Other(eye0_columns), x, y),
+            std::memcpy(out.At(raw.m_width + x, y), EyePixel(raw, OtherParity(eye0_columns), x, y),
                         FRAME_PIXEL_BYTES);
         }
     }
@@ -70,7 +70,7 @@ RgbaFrame Anaglyph(const RgbaFrame& raw, ColumnParity eye0_columns) {
         for (int32_t x = 0; x < out.m_width; ++x) {
             uint8_t* pixel = out.At(x, y);
             pixel[0] = Luma(EyePixel(raw, eye0_columns, x, y));
-            pixel[1] = pixel[2] = Luma(EyePixel(raw, Other(eye0_columns), x, y));
+            pixel[1] = pixel[2] = Luma(EyePixel(raw, OtherParity(eye0_columns), x, y));
             pixel[3] = 255;
         }
     }

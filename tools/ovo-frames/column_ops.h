@@ -22,6 +22,9 @@ struct MaskArea {
     int32_t m_outside_eye;
 };
 
+// The other eye's columns.
+ColumnParity OtherParity(ColumnParity parity);
+
 // The frame the panel receives: eye 0's pixels on the columns of `eye0_columns`, eye 1's on
 // the others; outside `area` (when given) only its outside eye's. Both eyes have the same
 // size.

@@ -9,6 +9,7 @@
 #include "disparity_summary.h"
 #include "eye_compensation.h"
 #include "frame_files.h"
+#include "screen_disparity.h"
 
 namespace ovo_frames_tool {
 
@@ -42,14 +43,17 @@ void PrintShift(const char* prefix, const char* name, bool known, float shift) {
     }
 }
 
-void PrintRange(const char* prefix, const DisparityRange& range, int32_t eye_width) {
+// `unit` names the pixels of the shifts, of which the screen is `width` wide.
+void PrintRange(const char* prefix, const DisparityRange& range, const char* unit, int32_t width) {
     const bool known = range.m_known_blocks > 0;
     std::printf("%sblocks_known = %d\n%sblocks_unknown = %d\n", prefix, range.m_known_blocks, prefix,
                 range.m_unknown_blocks);
-    PrintShift(prefix, "nearest_px", known, range.m_nearest);
-    PrintShift(prefix, "farthest_px", known, range.m_farthest);
-    PrintShift(prefix, "nearest_percent", known, ovo_frames::PercentOfWidth(range.m_nearest, eye_width));
-    PrintShift(prefix, "farthest_percent", known, ovo_frames::PercentOfWidth(range.m_farthest, eye_width));
+    const std::string nearest = std::string("nearest_") + unit;
+    const std::string farthest = std::string("farthest_") + unit;
+    PrintShift(prefix, nearest.c_str(), known, range.m_nearest);
+    PrintShift(prefix, farthest.c_str(), known, range.m_farthest);
+    PrintShift(prefix, "nearest_percent", known, ovo_frames::PercentOfWidth(range.m_nearest, width));
+    PrintShift(prefix, "farthest_percent", known, ovo_frames::PercentOfWidth(range.m_farthest, width));
 }
 
 void PrintComfort(const DisparityRange& range, int32_t eye_width, const ovo_frames::ComfortBudget& budget) {
@@ -98,19 +102,20 @@ int RunDisparity(const Arguments& arguments) {
     }
     RgbaFrame raw;
     if (!LoadRaw(arguments.m_files[0], &raw)) return EXIT_TROUBLE;
-    const ovo_frames::EyeImages eyes = ovo_frames::Deinterleave(raw, Eye0Columns(arguments));
-    const ovo_frames::DisparityField field = ovo_frames::MatchBlocks(eyes.m_eye0, eyes.m_eye1, options);
+    const ovo_frames::ColumnParity eye0_columns = Eye0Columns(arguments);
+    const ovo_frames::DisparityField field = ovo_frames::MeasureScreenDisparity(raw, eye0_columns, options);
     const DisparityRange range = ovo_frames::MeasureRange(field);
     if (arguments.m_map != nullptr && Save(arguments.m_map, ovo_frames::DisparityMapImage(field, range)) != 0) {
         return EXIT_TROUBLE;
     }
-    const int32_t eye_width = eyes.m_eye0.m_width;
+    const int32_t eye_width = field.m_image_width;
     PrintFrame(raw, options);
-    PrintRange("", range, eye_width);
+    PrintRange("", range, "px", eye_width);
     PrintComfort(range, eye_width, budget);
     PrintHistogram(ovo_frames::HistogramOf(field));
     if (band_rows > 0) {
-        PrintBands(ovo_frames::MatchBands(eyes.m_eye0, eyes.m_eye1, band_rows, options), band_rows, raw.m_height);
+        PrintBands(ovo_frames::MeasureScreenDisparityBands(raw, eye0_columns, band_rows, options), band_rows,
+                   raw.m_height);
     }
     if (arguments.m_map != nullptr) std::printf("map = %s\n", arguments.m_map);
     return range.m_known_blocks > 0 ? 0 : EXIT_NO;
@@ -125,16 +130,19 @@ int RunMatchEyes(const Arguments& arguments) {
     if (!LoadRaw(raw_path, &raw) || !LoadSameSize(arguments.m_files[1], raw, raw_path, &native)) return EXIT_TROUBLE;
     const ovo_frames::ColumnParity eye0_columns = Eye0Columns(arguments);
     const ovo_frames::EyeImages eyes = ovo_frames::Deinterleave(raw, eye0_columns);
-    const ovo_frames::EyeImages flat = ovo_frames::Deinterleave(native, eye0_columns);
     PrintFrame(raw, options);
+    // --max-shift is in eye pixels for both commands; the eyes are matched in screen pixels.
+    BlockMatchOptions on_screen = options;
+    on_screen.m_max_shift = options.m_max_shift * ovo_frames::EYE_PIXEL_SCREEN_COLUMNS;
     const struct {
         const char* m_prefix;
         const RgbaFrame& m_eye;
-        const RgbaFrame& m_native;
-    } pairs[] = {{"eye0.", eyes.m_eye0, flat.m_eye0}, {"eye1.", eyes.m_eye1, flat.m_eye1}};
+        ovo_frames::ColumnParity m_columns;
+    } pairs[] = {{"eye0.", eyes.m_eye0, eye0_columns}, {"eye1.", eyes.m_eye1, ovo_frames::OtherParity(eye0_columns)}};
     for (const auto& pair : pairs) {
-        const ovo_frames::CompensationSummary summary = ovo_frames::MeasureCompensation(pair.m_eye, pair.m_native, options);
-        PrintRange(pair.m_prefix, ovo_frames::MeasureRange(summary.m_shifts), pair.m_eye.m_width);
+        const ovo_frames::CompensationSummary summary =
+            ovo_frames::MeasureCompensation(pair.m_eye, native, pair.m_columns, on_screen);
+        PrintRange(pair.m_prefix, ovo_frames::MeasureRange(summary.m_shifts), "screen_px", raw.m_width);
         std::printf("%sunknown_fraction = %.3f\n%sresidual_mean = %.2f\n%sresidual_p95 = %.2f\n%sresidual_worst = %.2f\n",
                     pair.m_prefix, summary.m_unknown_fraction, pair.m_prefix, summary.m_residual_mean, pair.m_prefix,
                     summary.m_residual_high, pair.m_prefix, summary.m_residual_worst);

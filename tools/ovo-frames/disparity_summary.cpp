@@ -35,8 +35,8 @@ DisparityRange MeasureRange(const DisparityField& field, float outlier_percent) 
     return range;
 }
 
-float PercentOfWidth(float eye_pixels, int32_t eye_width) {
-    return eye_width > 0 ? 100.0f * eye_pixels / static_cast<float>(eye_width) : 0.0f;
+float PercentOfWidth(float pixels, int32_t width) {
+    return width > 0 ? 100.0f * pixels / static_cast<float>(width) : 0.0f;
 }
 
 DisparityHistogram HistogramOf(const DisparityField& field) {

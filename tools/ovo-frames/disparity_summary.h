@@ -7,8 +7,8 @@
 
 // What a disparity field says about the whole frame: its nearest and farthest depth, how
 // the blocks spread over the depths, and whether the range is comfortable to look at.
-// Disparities are x_eye1 - x_eye0 in eye pixels: negative in front of the screen (crossed),
-// positive behind it (uncrossed).
+// Disparities are x_eye1 - x_eye0 on the screen in eye pixels (see screen_disparity.h):
+// negative in front of the screen (crossed), positive behind it (uncrossed).
 namespace ovo_frames {
 
 // A few blocks on a depth edge or a repeating pattern can match wrongly; the range leaves
@@ -31,8 +31,8 @@ struct DisparityRange {
 DisparityRange MeasureRange(const DisparityField& field, float outlier_percent = DISPARITY_OUTLIER_PERCENT);
 
 // Each eye's image spans the whole screen, so an eye's width in eye pixels is the screen's
-// width.
-float PercentOfWidth(float eye_pixels, int32_t eye_width);
+// width; as is the frame's width in screen pixels.
+float PercentOfWidth(float pixels, int32_t width);
 
 struct DisparityHistogram {
     // The disparity of m_counts[0]; each count is of the known blocks whose disparity
