@@ -23,11 +23,21 @@ struct DisparityPrediction {
 // `window_width` / 2 screen pixels per unit, and an eye pixel is two screen pixels.
 DisparityPrediction PredictDisparity(float eye_distance, float eye_angle, int window_width);
 
+// How far apart a frame's eyes lie, in eye pixels: the largest separation measured, and
+// the largest departure from none (both 0 when nothing could be measured).
+struct FrameDepth {
+    float m_separation = 0.0f;
+    float m_flat_deviation = 0.0f;
+};
+
 // Checks with gtest expectations that `stereo`, the frame the library made of the program's
 // `native` frame, holds two eyes (eye 0 on the even columns) that are each the native frame
-// moved sideways inside `prediction` and nothing else (no black eye, nothing missing), and
-// that differ by a disparity above noise where the scene has depth, none where it is flat.
-void ExpectStereoFrame(const ovo_frames::RgbaFrame& native, const ovo_frames::RgbaFrame& stereo,
-                       SceneDepth depth, const DisparityPrediction& prediction);
+// moved sideways inside `prediction` and nothing else (no black eye, nothing missing).
+FrameDepth ExpectStereoFrame(const ovo_frames::RgbaFrame& native, const ovo_frames::RgbaFrame& stereo,
+                             SceneKind scene, const DisparityPrediction& prediction);
+
+// Over the frames of one run: depth above noise where the scene has depth, none where it
+// is flat. An animation may start where nothing can be measured, so the run decides.
+void ExpectSceneDepth(SceneKind scene, const FrameDepth& deepest);
 
 #endif

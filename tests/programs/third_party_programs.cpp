@@ -13,47 +13,47 @@ constexpr char SDL_TESTS[] = "/usr/libexec/installed-tests/SDL2";
 // scene has its own context, as glmark2 makes one per scene.
 struct Glmark2Benchmark {
     const char* m_description;
-    SceneDepth m_depth;
+    SceneKind m_scene;
     bool m_fast;
 };
 
 const Glmark2Benchmark GLMARK2_BENCHMARKS[] = {
-    {"build:use-vbo=false", SCENE_DEPTH_3D, true},
-    {"build:use-vbo=true", SCENE_DEPTH_3D, false},
-    {"texture:texture-filter=nearest", SCENE_DEPTH_3D, false},
-    {"texture:texture-filter=linear", SCENE_DEPTH_3D, false},
-    {"texture:texture-filter=mipmap", SCENE_DEPTH_3D, false},
-    {"shading:shading=gouraud", SCENE_DEPTH_3D, true},
-    {"shading:shading=blinn-phong-inf", SCENE_DEPTH_3D, false},
-    {"shading:shading=phong", SCENE_DEPTH_3D, true},
-    {"shading:shading=cel", SCENE_DEPTH_3D, false},
-    {"bump:bump-render=high-poly", SCENE_DEPTH_3D, false},
-    {"bump:bump-render=normals", SCENE_DEPTH_3D, false},
-    {"bump:bump-render=height", SCENE_DEPTH_3D, false},
-    {"effect2d:kernel=0,1,0;1,-4,1;0,1,0;", SCENE_DEPTH_FLAT, false},
-    {"effect2d:kernel=1,1,1,1,1;1,1,1,1,1;1,1,1,1,1;", SCENE_DEPTH_FLAT, false},
-    {"pulsar:light=false:quads=5:texture=false", SCENE_DEPTH_3D, false},
-    {"desktop:blur-radius=5:effect=blur:passes=1:separable=true:windows=4", SCENE_DEPTH_FLAT, false},
-    {"desktop:effect=shadow:windows=4", SCENE_DEPTH_FLAT, false},
+    {"build:use-vbo=false", SCENE_3D, true},
+    {"build:use-vbo=true", SCENE_3D, false},
+    {"texture:texture-filter=nearest", SCENE_3D, false},
+    {"texture:texture-filter=linear", SCENE_3D, false},
+    {"texture:texture-filter=mipmap", SCENE_3D, false},
+    {"shading:shading=gouraud", SCENE_3D, true},
+    {"shading:shading=blinn-phong-inf", SCENE_3D, false},
+    {"shading:shading=phong", SCENE_3D, true},
+    {"shading:shading=cel", SCENE_3D, false},
+    {"bump:bump-render=high-poly", SCENE_3D, false},
+    {"bump:bump-render=normals", SCENE_3D, false},
+    {"bump:bump-render=height", SCENE_3D, false},
+    {"effect2d:kernel=0,1,0;1,-4,1;0,1,0;", SCENE_FLAT, false},
+    {"effect2d:kernel=1,1,1,1,1;1,1,1,1,1;1,1,1,1,1;", SCENE_FLAT, false},
+    {"pulsar:light=false:quads=5:texture=false", SCENE_3D, false},
+    {"desktop:blur-radius=5:effect=blur:passes=1:separable=true:windows=4", SCENE_OFFSCREEN, false},
+    {"desktop:effect=shadow:windows=4", SCENE_OFFSCREEN, false},
     {"buffer:columns=200:interleave=false:update-dispersion=0.9:update-fraction=0.5:update-method=map",
-     SCENE_DEPTH_3D, false},
+     SCENE_3D_THIN_LINES, false},
     {"buffer:columns=200:interleave=false:update-dispersion=0.9:update-fraction=0.5:update-method=subdata",
-     SCENE_DEPTH_3D, false},
+     SCENE_3D_THIN_LINES, false},
     {"buffer:columns=200:interleave=true:update-dispersion=0.9:update-fraction=0.5:update-method=map",
-     SCENE_DEPTH_3D, false},
-    {"ideas:speed=duration", SCENE_DEPTH_3D, false},
-    {"jellyfish", SCENE_DEPTH_3D, false},
-    {"terrain", SCENE_DEPTH_3D, false},
-    {"shadow", SCENE_DEPTH_3D, false},
-    {"refract", SCENE_DEPTH_3D, false},
-    {"conditionals:fragment-steps=0:vertex-steps=0", SCENE_DEPTH_FLAT, false},
-    {"conditionals:fragment-steps=5:vertex-steps=0", SCENE_DEPTH_FLAT, false},
-    {"conditionals:fragment-steps=0:vertex-steps=5", SCENE_DEPTH_FLAT, false},
-    {"function:fragment-complexity=low:fragment-steps=5", SCENE_DEPTH_FLAT, false},
-    {"function:fragment-complexity=medium:fragment-steps=5", SCENE_DEPTH_FLAT, false},
-    {"loop:fragment-loop=false:fragment-steps=5:vertex-steps=5", SCENE_DEPTH_FLAT, false},
-    {"loop:fragment-steps=5:fragment-uniform=false:vertex-steps=5", SCENE_DEPTH_FLAT, false},
-    {"loop:fragment-steps=5:fragment-uniform=true:vertex-steps=5", SCENE_DEPTH_FLAT, false},
+     SCENE_3D_THIN_LINES, false},
+    {"ideas:speed=duration", SCENE_3D, false},
+    {"jellyfish", SCENE_3D, false},
+    {"terrain", SCENE_OFFSCREEN, false},
+    {"shadow", SCENE_3D, false},
+    {"refract", SCENE_3D, false},
+    {"conditionals:fragment-steps=0:vertex-steps=0", SCENE_3D_SCREEN_COLOURED, false},
+    {"conditionals:fragment-steps=5:vertex-steps=0", SCENE_3D_SCREEN_COLOURED, false},
+    {"conditionals:fragment-steps=0:vertex-steps=5", SCENE_3D_SCREEN_COLOURED, false},
+    {"function:fragment-complexity=low:fragment-steps=5", SCENE_3D_SCREEN_COLOURED, false},
+    {"function:fragment-complexity=medium:fragment-steps=5", SCENE_3D_SCREEN_COLOURED, false},
+    {"loop:fragment-loop=false:fragment-steps=5:vertex-steps=5", SCENE_3D_SCREEN_COLOURED, false},
+    {"loop:fragment-steps=5:fragment-uniform=false:vertex-steps=5", SCENE_3D_SCREEN_COLOURED, false},
+    {"loop:fragment-steps=5:fragment-uniform=true:vertex-steps=5", SCENE_3D_SCREEN_COLOURED, false},
 };
 
 // glmark2's scenes animate by the clock: half a second a frame takes each well into its
@@ -91,24 +91,24 @@ std::vector<ThirdPartyProgram> ThirdPartyPrograms() {
         programs.push_back({"glmark2_" + TestName(description),
                             {"glmark2-es2", "-b", description + ":nframes=3", "--size", WINDOW_SIZE,
                              "--visual-config", "stencil=8"},
-                            "", {GLMARK2_CLOCK_STEP}, 3, true, REDRAW_CONTINUOUS, benchmark.m_depth,
+                            "", {GLMARK2_CLOCK_STEP}, 3, true, REDRAW_CONTINUOUS, benchmark.m_scene,
                             benchmark.m_fast});
     }
     programs.push_back({"es2gears_x11", {"es2gears_x11"}, "", {}, 4, false, REDRAW_CONTINUOUS,
-                        SCENE_DEPTH_3D, false});
-    programs.push_back({"es2tri", {"es2tri"}, "", {}, 2, false, REDRAW_ON_EXPOSE, SCENE_DEPTH_FLAT, false});
+                        SCENE_3D, false});
+    programs.push_back({"es2tri", {"es2tri"}, "", {}, 2, false, REDRAW_ON_EXPOSE, SCENE_FLAT, false});
     // SDL picks GLX for an OpenGL ES context on X11 when the X server offers it; on a
     // device it always takes EGL, and so must it here to reach the library.
     const std::vector<std::string> sdl_environment = {"SDL_VIDEO_X11_FORCE_EGL=1"};
     programs.push_back({"testgles2", {"./testgles2", "--geometry", WINDOW_SIZE}, SDL_TESTS,
-                        sdl_environment, 4, false, REDRAW_CONTINUOUS, SCENE_DEPTH_3D, true});
+                        sdl_environment, 4, false, REDRAW_CONTINUOUS, SCENE_3D, true});
     // Some tests make their renderer without asking for one by name: the hint chooses it.
     std::vector<std::string> renderer_environment = sdl_environment;
     renderer_environment.push_back("SDL_RENDER_DRIVER=opengles2");
     for (const char* test : SDL_RENDERER_TESTS) {
         programs.push_back({std::string("sdl_") + test,
                             {std::string("./") + test, "--renderer", "opengles2", "--geometry", WINDOW_SIZE},
-                            SDL_TESTS, renderer_environment, 4, false, REDRAW_CONTINUOUS, SCENE_DEPTH_FLAT,
+                            SDL_TESTS, renderer_environment, 4, false, REDRAW_CONTINUOUS, SCENE_FLAT,
                             false});
     }
     return programs;

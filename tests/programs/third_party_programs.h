@@ -7,13 +7,23 @@
 
 #include "program_run.h"
 
-// Where a program's geometry lies in depth, which decides the disparity its eyes must show.
-enum SceneDepth {
-    // A perspective 3D scene: its surfaces lie behind the screen, so some parts of it must
-    // show a disparity above measuring noise.
-    SCENE_DEPTH_3D,
-    // Everything at clip-space depth 0 (2D renderers, full-screen effects): no disparity.
-    SCENE_DEPTH_FLAT,
+// What a program draws, which decides what its stereo frame must show (the checks of each
+// kind: stereo_frame_checks.cpp).
+enum SceneKind {
+    // A perspective 3D scene drawn into the window: its surfaces lie behind the screen.
+    SCENE_3D,
+    // The same, of lines one pixel wide: moved by a fraction of a pixel, a line lights other
+    // pixels, so an eye moved back matches the native frame less closely.
+    SCENE_3D_THIN_LINES,
+    // A 3D scene whose fragments take their colour from their place on the screen
+    // (gl_FragCoord): moving the geometry sideways leaves the colours where they were, so
+    // only the geometry's outline can be compared with the native frame.
+    SCENE_3D_SCREEN_COLOURED,
+    // 3D drawn into the program's own framebuffer and shown by one flat draw: draws into an
+    // application framebuffer are made once, unchanged, so the window shows it flat.
+    SCENE_OFFSCREEN,
+    // Everything at clip-space depth 0 (2D renderers, full-screen effects): flat.
+    SCENE_FLAT,
 };
 
 // A real, unmodified OpenGL ES 2.0 program from Debian, as the suite starts it.
@@ -25,7 +35,7 @@ struct ThirdPartyProgram {
     int m_frames;
     bool m_stops_by_itself;
     RedrawKind m_redraw;
-    SceneDepth m_depth;
+    SceneKind m_scene;
     // In the test command's fast subset.
     bool m_fast;
 };

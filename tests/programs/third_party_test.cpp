@@ -118,14 +118,18 @@ TEST_P(ThirdPartyInStereo, RunsAsNativelyAndComesOutInStereo) {
         << "no vertex shader went through the library";
 
     // Frame 1 is drawn before the first column mask exists; every later one is stereo.
+    FrameDepth deepest;
     for (int frame = 2; frame <= stereo.m_frames_captured; ++frame) {
         SCOPED_TRACE("frame " + std::to_string(frame));
         const ovo_frames::RgbaFrame stereo_frame = ReadFrame(FramePath(stereo_run.m_frame_directory, frame));
         const DisparityPrediction prediction = PredictDisparity(
             ProfileValue("eye_distance"), ProfileValue("eye_angle"), stereo_frame.m_width);
-        ExpectStereoFrame(ReadFrame(FramePath(native_run.m_frame_directory, frame)), stereo_frame,
-                          program.m_depth, prediction);
+        const FrameDepth depth = ExpectStereoFrame(ReadFrame(FramePath(native_run.m_frame_directory, frame)),
+                                                   stereo_frame, program.m_scene, prediction);
+        deepest.m_separation = std::max(deepest.m_separation, depth.m_separation);
+        deepest.m_flat_deviation = std::max(deepest.m_flat_deviation, depth.m_flat_deviation);
     }
+    ExpectSceneDepth(program.m_scene, deepest);
 }
 
 INSTANTIATE_TEST_SUITE_P(Debian, ThirdPartyInStereo, ::testing::ValuesIn(ThirdPartyPrograms()),
