@@ -4,6 +4,7 @@
 #include "core/raw_egl.h"
 #include "core/stereo_manager.h"
 #include "egl/context_registry.h"
+#include "egl/current_context.h"
 #include "entry/export.h"
 #include "stereo/shader_source_store.h"
 
@@ -24,6 +25,7 @@ extern "C" {
 OVO_EXPORT EGLBoolean EGLAPIENTRY eglDestroyContext(EGLDisplay dpy, EGLContext ctx) {
     const EGLBoolean result = ovo::vendor_egl::eglDestroyContext(dpy, ctx);
     if (result != EGL_FALSE) {
+        ovo::NoteEndedHandle(dpy, ctx);
         ovo::ForgetShareGroup(ovo::StereoManager::instance().m_contexts->NoteDestroyed(dpy, ctx));
     }
     return result;
@@ -33,6 +35,7 @@ OVO_EXPORT EGLBoolean EGLAPIENTRY eglDestroyContext(EGLDisplay dpy, EGLContext c
 OVO_EXPORT EGLBoolean EGLAPIENTRY eglTerminate(EGLDisplay dpy) {
     const EGLBoolean result = ovo::vendor_egl::eglTerminate(dpy);
     if (result != EGL_FALSE) {
+        ovo::NoteEndedHandle(dpy, nullptr);
         ovo::StereoManager::instance().m_contexts->NoteTerminated(dpy, ovo::ForgetShareGroup);
     }
     return result;
