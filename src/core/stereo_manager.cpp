@@ -96,7 +96,7 @@ StereoManager::StereoManager()
     m_shader_sources = new ShaderSourceStore();
     const bool shader_mode = mode == STEREO_MODE_SHADER || mode == STEREO_MODE_SHADER_LISTED;
     if (shader_mode && m_profile->m_valid) {
-        m_composer = new CompositionRenderer(0, m_profile->m_swap_eye_mask ? 1 : 0);
+        m_composer = new CompositionRenderer(m_profile->m_swap_eye_mask ? 1 : 0);
         m_interleave = true;
     }
     UpdateScale();
