@@ -10,6 +10,7 @@
 #include "egl/current_context.h"
 #include "entry/export.h"
 #include "present/composition_renderer.h"
+#include "stereo/eye_texture.h"
 #include "stereo/shader_source_store.h"
 
 namespace ovo {
@@ -22,11 +23,17 @@ void ForgetShareGroup(uint32_t group) {
 }
 
 bool HoldsObjects(const StereoManager& manager, const ContextFacts& context) {
-    return context.m_ends_group && manager.m_composer != nullptr &&
-           manager.m_composer->HoldsProgram(context.m_share_group);
+    const bool eye_textures = manager.m_eye_textures != nullptr &&
+                              manager.m_eye_textures->Holds(context.m_context);
+    const bool mask_program = context.m_ends_group && manager.m_composer != nullptr &&
+                              manager.m_composer->HoldsProgram(context.m_share_group);
+    return eye_textures || mask_program;
 }
 
 void ReleaseObjects(StereoManager& manager, const ContextFacts& context, bool deletable) {
+    if (manager.m_eye_textures != nullptr) {
+        manager.m_eye_textures->Release(context.m_context, deletable);
+    }
     if (context.m_ends_group && manager.m_composer != nullptr) {
         manager.m_composer->ReleaseProgram(context.m_share_group, deletable);
     }
