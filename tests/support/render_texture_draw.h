@@ -6,6 +6,8 @@
 // exported GL functions of whatever library the program links.
 #include <GLES2/gl2.h>
 
+#include <initializer_list>
+
 struct RenderTextureDraw {
     GLuint m_texture = 0;
     GLuint m_framebuffer = 0;
