@@ -1,6 +1,6 @@
 // The OpenGL ES 2.0 drawing path of the column mask, with a program of its own: built once
-// per share group, where the mask is first drawn, since compiling it at every swap cost
-// llvmpipe from 0.65 ms (its shader cache on) to 21 ms (off) per frame.
+// per share group, where the mask is first drawn. Compiled at every swap, it cost llvmpipe
+// up to 20 ms a frame without Mesa's shader cache (bench/README.md).
 #include <iterator>
 
 #include "core/gl_state_table.h"
