@@ -27,48 +27,52 @@ struct EyeNames {
     GLuint m_program = 0;
 };
 
-// The EGL calls of one run of a scenario: through the library, which draws a render
-// texture and swaps at each Draw (so that it keeps eye textures and a mask program), or
-// straight to Mesa, which draws nothing. eglGetError is read after each call.
+// The application's EGL calls, through the library or straight to Mesa.
+struct EglCalls {
+    decltype(&::eglCreateContext) m_create;
+    decltype(&::eglMakeCurrent) m_make_current;
+    decltype(&::eglDestroyContext) m_destroy;
+    decltype(&::eglTerminate) m_terminate;
+    decltype(&::eglSwapBuffers) m_swap;
+};
+const EglCalls LIBRARY = {&::eglCreateContext, &::eglMakeCurrent, &::eglDestroyContext,
+                          &::eglTerminate, &::eglSwapBuffers};
+const EglCalls MESA = {&ovo::vendor_egl::eglCreateContext, &ovo::vendor_egl::eglMakeCurrent,
+                       &ovo::vendor_egl::eglDestroyContext, &ovo::vendor_egl::eglTerminate,
+                       &ovo::vendor_egl::eglSwapBuffers};
+
+// One run of a scenario: through the library, which draws a render texture before each
+// swap (so that it keeps eye textures and a mask program), or straight to Mesa, which
+// only swaps. eglGetError is read after each of the application's EGL calls.
 class EglRun {
 public:
-    explicit EglRun(bool library) : m_library(library) {
+    explicit EglRun(bool library) : m_library(library), m_egl(library ? LIBRARY : MESA) {
         m_session.Open(2);
         for (EGLSurface& surface : m_surfaces) surface = m_session.CreateSurface(16, 16);
     }
 
     EGLContext Create(EGLContext share = EGL_NO_CONTEXT) {
         const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, 2, EGL_NONE};
-        return Noted(m_library ? eglCreateContext(m_session.m_display, m_session.m_config, share, version)
-                               : ovo::vendor_egl::eglCreateContext(m_session.m_display,
-                                                                   m_session.m_config, share, version));
+        return Noted(m_egl.m_create(m_session.m_display, m_session.m_config, share, version));
     }
     // With the surface of the main thread (0) or of another (1): a surface is current on
     // one thread at most.
     void MakeCurrent(EGLContext context, int thread = 0) {
         const EGLSurface surface = context != EGL_NO_CONTEXT ? m_surfaces[thread] : EGL_NO_SURFACE;
-        Noted(m_library ? eglMakeCurrent(m_session.m_display, surface, surface, context)
-                        : ovo::vendor_egl::eglMakeCurrent(m_session.m_display, surface, surface, context));
+        Noted(m_egl.m_make_current(m_session.m_display, surface, surface, context));
     }
-    void Destroy(EGLContext context) {
-        Noted(m_library ? eglDestroyContext(m_session.m_display, context)
-                        : ovo::vendor_egl::eglDestroyContext(m_session.m_display, context));
-    }
-    void Terminate() {
-        Noted(m_library ? eglTerminate(m_session.m_display)
-                        : ovo::vendor_egl::eglTerminate(m_session.m_display));
-    }
-    // A frame, swapped; through the library, a render texture drawn to the window first.
-    // The library's eye textures of the current context that the draw left, if any.
+    void Destroy(EGLContext context) { Noted(m_egl.m_destroy(m_session.m_display, context)); }
+    void Terminate() { Noted(m_egl.m_terminate(m_session.m_display)); }
+    // A frame, swapped. The library's eye textures of the current context that the draw
+    // left, if any.
     EyeNames Draw(int thread = 0) {
-        if (!m_library) {
-            Noted(ovo::vendor_egl::eglSwapBuffers(m_session.m_display, m_surfaces[thread]));
-            return {};
+        if (m_library) {
+            RenderTextureDraw draw;
+            draw.Create(8);
+            draw.DrawToWindow();
         }
-        RenderTextureDraw draw;
-        draw.Create(8);
-        draw.DrawToWindow();
-        Noted(eglSwapBuffers(m_session.m_display, m_surfaces[thread]));
+        Noted(m_egl.m_swap(m_session.m_display, m_surfaces[thread]));
+        if (!m_library) return {};
         const ovo::EyeTexturePair* eyes =
             ovo::StereoManager::instance().m_eye_textures->Find(ovo::CurrentContext());
         if (eyes == nullptr) return {};
@@ -104,6 +108,7 @@ private:
         return result;
     }
 
+    EglCalls m_egl;
     MesaSession m_session;
     EGLSurface m_surfaces[2] = {};
 };
@@ -141,6 +146,9 @@ TEST_F(ContextObjectsOnMesa, AContextEndedWhileAnotherIsCurrent) {
         const EyeNames names = run.Draw();
         run.MakeCurrent(own);
         run.Draw();
+        if (run.m_library) {
+            EXPECT_TRUE(EglRun::AnyAlive(names));
+        }
         run.Destroy(ended);
         if (run.m_library) {
             run.ExpectBoundTo(own);
@@ -158,6 +166,9 @@ TEST_F(ContextObjectsOnMesa, AContextEndedWhileCurrent) {
         const EGLContext ended = run.Create();
         run.MakeCurrent(ended);
         const EyeNames names = run.Draw();
+        if (run.m_library) {
+            EXPECT_TRUE(EglRun::AnyAlive(names));
+        }
         run.Destroy(ended);
         if (run.m_library) {
             run.ExpectBoundTo(ended);  // until the thread leaves it
@@ -205,6 +216,9 @@ TEST_F(ContextObjectsOnMesa, TerminatingADisplayWithSeveralContexts) {
         names[0] = run.Draw();
         run.MakeCurrent(own);
         names[1] = run.Draw();
+        if (run.m_library) {
+            for (const EyeNames& each : names) EXPECT_TRUE(EglRun::AnyAlive(each));
+        }
         run.Terminate();
         if (run.m_library) {
             run.ExpectBoundTo(own);  // the display's contexts end as the thread leaves them
