@@ -73,6 +73,13 @@ inline const DriverHooks& CurrentHooks() {
 // Binds the calling thread to the table clientApiIndex selects, or to NoContextHooks.
 void SelectThreadHooks(bool context_bound);
 
+// The table of a context whose client version gave `client_api_index` (0: ES 1.x, 1: ES 2.0).
+const DriverHooks* ClientApiHooks(uint32_t client_api_index);
+// The calling thread's own DriverHooksKey value (null for a thread that never set one), and
+// setting it: the library puts it back after working in a context of its own choosing.
+inline const void* ThreadHooks() { return pthread_getspecific(g_driver_hooks_key); }
+inline void SetThreadHooks(const void* hooks) { pthread_setspecific(g_driver_hooks_key, hooks); }
+
 }  // namespace ovo
 
 #endif

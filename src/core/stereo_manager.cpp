@@ -96,7 +96,7 @@ StereoManager::StereoManager()
     m_shader_sources = new ShaderSourceStore();
     const bool shader_mode = mode == STEREO_MODE_SHADER || mode == STEREO_MODE_SHADER_LISTED;
     if (shader_mode && m_profile->m_valid) {
-        m_composer = new CompositionRenderer(0, m_profile->m_swap_eye_mask ? 1 : 0);
+        m_composer = new CompositionRenderer(m_profile->m_swap_eye_mask ? 1 : 0);
         m_interleave = true;
     }
     UpdateScale();
@@ -111,7 +111,7 @@ void StereoManager::ReleaseAtExit() {
     // The profile stays, back at its defaults with stereo off: the EGL calls read it.
     static_cast<StereoProfileFields&>(*m_profile) = StereoProfileFields();
     m_profile->m_mode = STEREO_MODE_OFF;
-    // Its GL objects went with their context; only the record is freed.
+    // Their GL objects go with their contexts; only the records are freed.
     delete m_eye_textures;
     delete m_shader_sources;
     // The context registry stays: EGL calls from exit handlers still keep it.

@@ -19,6 +19,8 @@ class OverlayTarget;
 class ShaderSourceStore;
 class ViewerTracker;
 struct EyeTexturePair;
+template <typename Owner, typename Record>
+class ContextObjectTable;
 
 // A rectangle as glViewport and glScissor take it.
 struct GlRect {
@@ -79,7 +81,8 @@ public:
     OverlayTarget* m_overlay;
     ViewerTracker* m_viewer;
     GlObjectTracker* m_objects;
-    EyeTexturePair* m_eye_textures;
+    // The eye textures of each context (the tracked ES 2.0 submode).
+    ContextObjectTable<EGLContext, EyeTexturePair>* m_eye_textures;
     CompositionRenderer* m_composer;
     uint32_t m_frame_number;
     bool m_es2_layer_installed;

@@ -137,12 +137,14 @@ namespace vendor_egl::unbound {
 }  // namespace vendor_egl::unbound
 
 void SelectThreadHooks(bool context_bound) {
-    const DriverHooks* hooks = &g_vendor_driver.m_no_context_hooks;
-    if (context_bound) {
-        hooks = g_vendor_driver.m_client_api_index == 1 ? &g_vendor_driver.m_es2_hooks
-                                                        : &g_vendor_driver.m_es1_hooks;
-    }
-    pthread_setspecific(g_driver_hooks_key, hooks);
+    const DriverHooks* hooks = context_bound ? ClientApiHooks(g_vendor_driver.m_client_api_index)
+                                             : &g_vendor_driver.m_no_context_hooks;
+    SetThreadHooks(hooks);
 }
+
+const DriverHooks* ClientApiHooks(uint32_t client_api_index) {
+    return client_api_index == 1 ? &g_vendor_driver.m_es2_hooks : &g_vendor_driver.m_es1_hooks;
+}
+
 
 }  // namespace ovo

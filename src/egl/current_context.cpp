@@ -3,11 +3,25 @@
 namespace ovo {
 
 namespace {
-thread_local EGLContext g_current_context = EGL_NO_CONTEXT;
+thread_local EglBinding g_binding = {EGL_NO_DISPLAY, EGL_NO_SURFACE, EGL_NO_SURFACE,
+                                     EGL_NO_CONTEXT, false};
 }  // namespace
 
-EGLContext CurrentContext() { return g_current_context; }
+const EglBinding& CurrentBinding() { return g_binding; }
 
-void NoteCurrentContext(EGLContext context) { g_current_context = context; }
+EGLContext CurrentContext() { return g_binding.m_context; }
+
+void NoteCurrentBinding(EGLDisplay display, EGLSurface draw, EGLSurface read,
+                        EGLContext context) {
+    g_binding = EglBinding{display, draw, read, context, false};
+}
+
+void NoteEndedHandle(EGLDisplay display, const void* handle) {
+    if (g_binding.m_context == EGL_NO_CONTEXT || display != g_binding.m_display) return;
+    if (handle == nullptr || handle == g_binding.m_context || handle == g_binding.m_draw ||
+        handle == g_binding.m_read) {
+        g_binding.m_ending = true;
+    }
+}
 
 }  // namespace ovo

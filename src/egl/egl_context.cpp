@@ -78,11 +78,11 @@ OVO_EXPORT EGLContext EGLAPIENTRY eglCreateContext(EGLDisplay dpy, EGLConfig con
                                                    const EGLint* attrib_list) {
     EGLContext context = ovo::vendor_egl::eglCreateContext(dpy, config, share_context, attrib_list);
     ovo::StereoManager& manager = ovo::StereoManager::instance();
-    manager.m_contexts->NoteCreated(dpy, context, share_context);
     // The overlay's objects are made again in whatever context is made current next.
     if (manager.m_profile->m_eye_target) manager.m_overlay->Reset();
     if (context == EGL_NO_CONTEXT) return context;
     uint32_t index = ovo::ClientApiIndex(manager, attrib_list);
+    manager.m_contexts->NoteCreated(dpy, context, share_context, index);
     ovo::g_vendor_driver.m_client_api_index = index;
     if (manager.m_profile->m_enabled) ovo::WriteVersionReport(manager, index);
     return context;
@@ -98,12 +98,22 @@ OVO_EXPORT EGLBoolean EGLAPIENTRY eglMakeCurrent(EGLDisplay dpy, EGLSurface draw
     EGLBoolean result = ovo::vendor_egl::eglMakeCurrent(dpy, draw, read, ctx);
     if (result == EGL_TRUE) {
         ovo::SelectThreadHooks(has_context);
-        ovo::NoteCurrentContext(ctx);
+        ovo::NoteCurrentBinding(dpy, draw, read, ctx);
     }
     // The rest runs even when the vendor refused, as long as a context was named.
     if (!has_context) return result;
     if (eye_target) manager.m_overlay->Create();
     ovo::CaptureSurfaceSize(manager, dpy, draw, result == EGL_TRUE);
+    return result;
+}
+
+// Leaves the thread with nothing current, as eglMakeCurrent without a context does.
+OVO_EXPORT EGLBoolean EGLAPIENTRY eglReleaseThread() {
+    const EGLBoolean result = ovo::vendor_egl::eglReleaseThread();
+    if (result != EGL_FALSE) {
+        ovo::SelectThreadHooks(false);
+        ovo::NoteCurrentBinding(EGL_NO_DISPLAY, EGL_NO_SURFACE, EGL_NO_SURFACE, EGL_NO_CONTEXT);
+    }
     return result;
 }
 

@@ -1,5 +1,6 @@
-// The OpenGL ES 2.0 drawing path of the column mask: a program of its own, built and
-// deleted again in every frame.
+// The OpenGL ES 2.0 drawing path of the column mask, with a program of its own: built once
+// per share group, where the mask is first drawn. Compiled at every swap, it cost llvmpipe
+// up to 20 ms a frame without Mesa's shader cache (bench/README.md).
 #include <iterator>
 
 #include "core/gl_state_table.h"
@@ -78,22 +79,33 @@ GLuint CompileShader(GLenum type, const char* const* source) {
     return shader;
 }
 
-}  // namespace
-
-// A failed compile or link is not looked at: that frame's mask then draws nothing.
-void CompositionRenderer::BuildProgram() {
-    m_program = raw::glCreateProgram();
-    m_vertex_shader = CompileShader(GL_VERTEX_SHADER, COMPOSITION_VERTEX_SOURCE);
-    m_fragment_shader = CompileShader(GL_FRAGMENT_SHADER, COMPOSITION_FRAGMENT_SOURCE);
-    raw::glAttachShader(m_program, m_vertex_shader);
-    raw::glAttachShader(m_program, m_fragment_shader);
-    raw::glBindAttribLocation(m_program, 0, "myVertex");
-    raw::glLinkProgram(m_program);
+// A failed compile or link is not looked at: the mask then draws nothing.
+MaskProgram BuildMaskProgram() {
+    MaskProgram built;
+    built.m_program = raw::glCreateProgram();
+    const GLuint vertex = CompileShader(GL_VERTEX_SHADER, COMPOSITION_VERTEX_SOURCE);
+    const GLuint fragment = CompileShader(GL_FRAGMENT_SHADER, COMPOSITION_FRAGMENT_SOURCE);
+    raw::glAttachShader(built.m_program, vertex);
+    raw::glAttachShader(built.m_program, fragment);
+    raw::glBindAttribLocation(built.m_program, 0, "myVertex");
+    raw::glLinkProgram(built.m_program);
+    // The program keeps what it needs; the shaders go when it goes.
+    raw::glDeleteShader(vertex);
+    raw::glDeleteShader(fragment);
     GLint linked = GL_FALSE;
-    raw::glGetProgramiv(m_program, GL_LINK_STATUS, &linked);
+    raw::glGetProgramiv(built.m_program, GL_LINK_STATUS, &linked);
+    built.m_matrix_location = raw::glGetUniformLocation(built.m_program, "myPMVMatrix");
+    built.m_color_location = raw::glGetUniformLocation(built.m_program, "color");
+    return built;
 }
 
-void CompositionRenderer::DrawLinesGl2(GLsizei width, GLsizei height) {
+}  // namespace
+
+void MaskProgram::Delete() const { raw::glDeleteProgram(m_program); }
+
+// A context of no known share group (past the registry's capacity, or destroyed while
+// still current) has no group to keep the program for: it gets one for this frame only.
+void CompositionRenderer::DrawLinesGl2(GLsizei width, GLsizei height, uint32_t share_group) {
     GlStateSnapshot saved;
     saved.Save(COMPOSITION_GL2_SAVED, std::size(COMPOSITION_GL2_SAVED));
     GlStateSnapshot::Set(COMPOSITION_GL2_SET, std::size(COMPOSITION_GL2_SET));
@@ -102,19 +114,18 @@ void CompositionRenderer::DrawLinesGl2(GLsizei width, GLsizei height) {
     raw::glScissor(0, 0, width, height);
     GlStateSnapshot::Set(COMPOSITION_GL2_DISABLED, std::size(COMPOSITION_GL2_DISABLED));
 
-    BuildProgram();
-    raw::glUseProgram(m_program);
-    m_matrix_location = raw::glGetUniformLocation(m_program, "myPMVMatrix");
-    raw::glUniformMatrix4fv(m_matrix_location, 1, GL_FALSE, m_projection);
-    m_color_location = raw::glGetUniformLocation(m_program, "color");
-    raw::glUniform4f(m_color_location, 1.0f, 1.0f, 1.0f, 1.0f);
+    MaskProgram* kept = m_programs.Find(share_group);
+    if (kept == nullptr && (kept = m_programs.Claim(share_group)) != nullptr) {
+        *kept = BuildMaskProgram();
+    }
+    const MaskProgram program = kept != nullptr ? *kept : BuildMaskProgram();
+    raw::glUseProgram(program.m_program);
+    raw::glUniformMatrix4fv(program.m_matrix_location, 1, GL_FALSE, m_projection);
+    raw::glUniform4f(program.m_color_location, 1.0f, 1.0f, 1.0f, 1.0f);
     raw::glEnableVertexAttribArray(0);
     raw::glVertexAttribPointer(0, 2, GL_FLOAT, GL_FALSE, 0, m_vertices);
     raw::glDrawArrays(GL_LINES, 0, 2 * m_line_count);
-
-    raw::glDeleteShader(m_vertex_shader);
-    raw::glDeleteShader(m_fragment_shader);
-    raw::glDeleteProgram(m_program);
+    if (kept == nullptr) program.Delete();
     saved.Restore(COMPOSITION_GL2_RESTORE_ORDER, std::size(COMPOSITION_GL2_RESTORE_ORDER));
 }
 

@@ -4,6 +4,8 @@
 
 #include "core/raw_gl.h"
 #include "core/stereo_manager.h"
+#include "egl/context_registry.h"
+#include "egl/current_context.h"
 #include "present/matrix4.h"
 #include "present/panel_control.h"
 
@@ -35,16 +37,8 @@ TargetSize MaskSize(const StereoProfileFields& profile) {
 
 }  // namespace
 
-CompositionRenderer::CompositionRenderer(GLint color_location, uint32_t swap_eyes)
-    : m_line_count(0),
-      m_vertices(nullptr),
-      m_projection{},
-      m_matrix_location(0),
-      m_color_location(color_location),
-      m_swap_eyes(swap_eyes != 0 ? 1 : 0),
-      m_program(0),
-      m_vertex_shader(0),
-      m_fragment_shader(0) {}
+CompositionRenderer::CompositionRenderer(uint32_t swap_eyes)
+    : m_line_count(0), m_vertices(nullptr), m_projection{}, m_swap_eyes(swap_eyes != 0 ? 1 : 0) {}
 
 CompositionRenderer::~CompositionRenderer() {
     delete[] m_vertices;
@@ -137,7 +131,8 @@ void CompositionRenderer::DrawMask(const StereoManager& manager) {
     raw::glStencilOp(GL_REPLACE, GL_KEEP, GL_KEEP);
     const TargetSize size = MaskSize(*manager.m_profile);
     if (manager.m_es2_layer_installed) {
-        DrawLinesGl2(size.m_width, size.m_height);
+        DrawLinesGl2(size.m_width, size.m_height,
+                     manager.m_contexts->ShareGroupOf(CurrentContext()));
     } else {
         DrawLinesGl1(size.m_width, size.m_height);
     }

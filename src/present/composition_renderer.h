@@ -5,10 +5,20 @@
 
 #include "config/stereo_profile_fields.h"
 #include "core/gl_api.h"
+#include "egl/context_objects.h"
 
 namespace ovo {
 
 class StereoManager;
+
+// The OpenGL ES 2.0 mask's program in one share group, with its uniforms' locations.
+struct MaskProgram {
+    GLuint m_program;
+    GLint m_matrix_location;
+    GLint m_color_location;
+
+    void Delete() const;
+};
 
 // Column interleaving through the stencil buffer: after each swap the stencil becomes 1
 // everywhere and 0 on every second pixel column, and each eye's pass draws where the
@@ -16,7 +26,7 @@ class StereoManager;
 class CompositionRenderer {
 public:
     // swap_eyes: non-zero exchanges the two eyes' stencil references.
-    CompositionRenderer(GLint color_location, uint32_t swap_eyes);
+    explicit CompositionRenderer(uint32_t swap_eyes);
     ~CompositionRenderer();
     CompositionRenderer(const CompositionRenderer&) = delete;
     CompositionRenderer& operator=(const CompositionRenderer&) = delete;
@@ -34,6 +44,13 @@ public:
     // Whether the mask is drawn at the profile's target size; otherwise at 800 x 480.
     static bool IsKnownTargetSize(const StereoProfileFields& profile);
 
+    // The ES 2.0 mask's program is built once per share group, where the mask is first
+    // drawn, and goes with the group's last context.
+    bool HoldsProgram(uint32_t share_group) const { return m_programs.Holds(share_group); }
+    void ReleaseProgram(uint32_t share_group, bool deletable) {
+        m_programs.Release(share_group, deletable);
+    }
+
     int32_t LineCount() const { return m_line_count; }
     // Line i is entries 4i..4i+3: x0, y0, x1, y1.
     const float* Vertices() const { return m_vertices; }
@@ -46,19 +63,14 @@ private:
     // Allocates room for the lines; false (and no lines) when memory is short.
     bool AllocateLines(const StereoProfileFields& profile);
     void DrawMask(const StereoManager& manager);
-    void DrawLinesGl2(GLsizei width, GLsizei height);
+    void DrawLinesGl2(GLsizei width, GLsizei height, uint32_t share_group);
     void DrawLinesGl1(GLsizei width, GLsizei height) const;
-    void BuildProgram();
 
     int32_t m_line_count;
     float* m_vertices;
     float m_projection[16];
-    GLint m_matrix_location;
-    GLint m_color_location;
     uint32_t m_swap_eyes;
-    GLuint m_program;
-    GLuint m_vertex_shader;
-    GLuint m_fragment_shader;
+    ContextObjectTable<uint32_t, MaskProgram> m_programs;
 };
 
 }  // namespace ovo

@@ -1,8 +1,13 @@
 #include "stereo/double_width_draws.h"
 
+#include <cstdint>
+#include <new>
+
 #include "core/raw_gl.h"
 #include "core/saturating_math.h"
 #include "core/stereo_manager.h"
+#include "egl/context_registry.h"
+#include "egl/current_context.h"
 #include "stereo/depth_shift.h"
 #include "stereo/draw_call.h"
 #include "stereo/eye_bracket.h"
@@ -15,10 +20,20 @@ namespace ovo {
 
 namespace {
 
-EyeTexturePair& PreparedEyeTextures(StereoManager& manager) {
-    if (manager.m_eye_textures == nullptr) manager.m_eye_textures = new EyeTexturePair();
-    manager.m_eye_textures->Prepare();
-    return *manager.m_eye_textures;
+// The current context's eye textures, made at its first use; null for a context that the
+// library cannot see end (past the registry's capacity, or destroyed while still current),
+// or when there is no room to keep them.
+EyeTexturePair* KeptEyeTextures(StereoManager& manager) {
+    if (manager.m_eye_textures == nullptr) {
+        manager.m_eye_textures = new (std::nothrow) EyeTextureTable();
+        if (manager.m_eye_textures == nullptr) return nullptr;
+    }
+    const EGLContext context = CurrentContext();
+    if (EyeTexturePair* kept = manager.m_eye_textures->Find(context)) return kept;
+    if (manager.m_contexts->ShareGroupOf(context) == SHARE_GROUP_NONE) return nullptr;
+    EyeTexturePair* made = manager.m_eye_textures->Claim(context);
+    if (made != nullptr) made->Create();
+    return made;
 }
 
 }  // namespace
@@ -65,7 +80,10 @@ void DrawIntoDoubleWidth(StereoManager& manager, const DrawCall& draw) {
 
 void DrawRenderTexturePerEye(StereoManager& manager, const DrawCall& draw,
                              const TextureRecord& texture) {
-    EyeTexturePair& eyes = PreparedEyeTextures(manager);
+    EyeTexturePair* kept = KeptEyeTextures(manager);
+    EyeTexturePair for_this_draw{};
+    if (kept == nullptr) for_this_draw.Create();
+    EyeTexturePair& eyes = kept != nullptr ? *kept : for_this_draw;
     GlStateGuard guard;
     guard.Save(GUARD_TEXTURE);
     for (EyeTexture& eye : eyes.m_eyes) eye.Resize(texture.m_width, texture.m_height);
@@ -85,6 +103,7 @@ void DrawRenderTexturePerEye(StereoManager& manager, const DrawCall& draw,
         ApplyEyeViewport(manager, eye, manager.ScaleX(), manager.ScaleY());
     });
     guard.Restore();
+    if (kept == nullptr) for_this_draw.Delete();
 }
 
 }  // namespace ovo

@@ -1,6 +1,5 @@
 #include "stereo/eye_texture.h"
 
-#include "core/raw_egl.h"
 #include "core/raw_gl.h"
 #include "stereo/gl_state_guard.h"
 
@@ -110,10 +109,7 @@ void EyeTexture::CopyHalf(const GLfloat* coordinates) const {
     guard.Restore();
 }
 
-void EyeTexturePair::Prepare() {
-    const EGLContext context = vendor_egl::eglGetCurrentContext();
-    if (context == m_context && context != EGL_NO_CONTEXT) return;
-    m_context = context;
+void EyeTexturePair::Create() {
     GlStateGuard guard;
     guard.Save(GUARD_TEXTURE | GUARD_FRAMEBUFFER);
     const GLuint program = CreateCopyProgram();
@@ -122,6 +118,14 @@ void EyeTexturePair::Prepare() {
         eye.m_program = program;
     }
     guard.Restore();
+}
+
+void EyeTexturePair::Delete() const {
+    for (const EyeTexture& eye : m_eyes) {
+        raw::glDeleteFramebuffers(1, &eye.m_framebuffer);
+        raw::glDeleteTextures(1, &eye.m_texture);
+    }
+    raw::glDeleteProgram(m_eyes[0].m_program);
 }
 
 }  // namespace ovo

@@ -2,6 +2,7 @@
 #define OVO_STEREO_EYE_TEXTURE_H
 
 #include "core/gl_api.h"
+#include "egl/context_objects.h"
 
 namespace ovo {
 
@@ -25,16 +26,18 @@ private:
     void CopyHalf(const GLfloat* coordinates) const;
 };
 
-// The two eyes' copies, eye 0 first. Owned by the manager; the GL objects are made by
-// the first draw that needs them, in that draw's context, and again after the context
-// changed (the old names went with their context).
+// The two eyes' copies, eye 0 first, sharing one copy program: made in one context and
+// used, and deleted, only there.
 struct EyeTexturePair {
     EyeTexture m_eyes[2];
-    EGLContext m_context;
 
-    // Both eye textures usable in the current context.
-    void Prepare();
+    // Makes the textures, their framebuffers and the program in the current context.
+    void Create();
+    void Delete() const;
 };
+
+// The eye textures of each context that drew a render texture to its window.
+using EyeTextureTable = ContextObjectTable<EGLContext, EyeTexturePair>;
 
 }  // namespace ovo
 

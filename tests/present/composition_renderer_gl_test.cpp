@@ -108,7 +108,7 @@ protected:
         return program;
     }
 
-    ovo::CompositionRenderer m_renderer{0, 1};
+    ovo::CompositionRenderer m_renderer{1};
     DrawingPath m_path = PATH_GL1;
     int32_t m_width = 0;
     int32_t m_height = 0;
@@ -305,7 +305,7 @@ TEST_F(StateOnMesa, TheGl2PathLeavesTheApplicationsStateAsItWas) {
 TEST_F(CompositionOnMesa, AnEs2ProgramThatSetsItsAttributeOnceDrawsAgainAfterTheSwap) {
     Open(PATH_GL2, 64, 32);
     ovo::StereoManager& manager = ovo::StereoManager::instance();
-    manager.m_composer = new ovo::CompositionRenderer(0, 1);  // released at exit
+    manager.m_composer = new ovo::CompositionRenderer(1);  // released at exit
     manager.m_interleave = true;
     static const GLfloat TRIANGLE[] = {-0.5f, -0.5f, 0.5f, -0.5f, 0.0f, 0.5f};
     GLuint buffer = 0;

@@ -44,7 +44,7 @@ protected:
     }
 
     EglSession m_egl;
-    ovo::CompositionRenderer m_renderer{0, 1};
+    ovo::CompositionRenderer m_renderer{1};
 };
 
 // The recorded GL calls, naming the first one that differs.
@@ -154,7 +154,7 @@ TEST_F(CompositionRendererTest, EyesSelectTheirStencilReferenceAndClearsKeepTheM
                  {0, 1, "glStencilFunc(0x0202, 1, 1)"}};
     for (const Case& each : cases) {
         ResetRecorder();
-        ovo::CompositionRenderer(0, each.m_swap_eyes).SelectEye(each.m_eye);
+        ovo::CompositionRenderer(each.m_swap_eyes).SelectEye(each.m_eye);
         EXPECT_EQ(RecordedGlCalls(), std::vector<std::string>{each.m_call})
             << "swap " << each.m_swap_eyes << " eye " << each.m_eye;
     }
@@ -306,16 +306,17 @@ TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
         "glColorMask(0, 0, 0, 0)", "glDepthMask(0)", "glCullFace(0x0405)", "glFrontFace(0x0901)",
         "glBindBuffer(0x8892, 0)", "glViewport(0, 0, 800, 480)", "glScissor(0, 0, 800, 480)",
         "glDisable(0x0B44)", "glDisable(0x0B71)",
-        // this frame's program
+        // the share group's program, built at its first frame and kept
         "glCreateProgram()", "glCreateShader(0x8B31)", "glShaderSource(11, 1, ptr, null)",
         "glCompileShader(11)", "glCreateShader(0x8B30)", "glShaderSource(12, 1, ptr, null)",
         "glCompileShader(12)", "glAttachShader(7, 11)", "glAttachShader(7, 12)",
-        "glBindAttribLocation(7, 0, ptr)", "glLinkProgram(7)", "glGetProgramiv(7, 0x8B82, ptr)",
+        "glBindAttribLocation(7, 0, ptr)", "glLinkProgram(7)", "glDeleteShader(11)",
+        "glDeleteShader(12)", "glGetProgramiv(7, 0x8B82, ptr)", "glGetUniformLocation(7, ptr)",
+        "glGetUniformLocation(7, ptr)",
         // drawn
-        "glUseProgram(7)", "glGetUniformLocation(7, ptr)", "glUniformMatrix4fv(3, 1, 0, ptr)",
-        "glGetUniformLocation(7, ptr)", "glUniform4f(3, 1, 1, 1, 1)",
+        "glUseProgram(7)", "glUniformMatrix4fv(3, 1, 0, ptr)", "glUniform4f(3, 1, 1, 1, 1)",
         "glEnableVertexAttribArray(0)", "glVertexAttribPointer(0, 2, 0x1406, 0, 0, ptr)",
-        "glDrawArrays(1, 0, 802)", "glDeleteShader(11)", "glDeleteShader(12)", "glDeleteProgram(7)",
+        "glDrawArrays(1, 0, 802)",
         // restored: the attribute's buffer bound to put it back, then the application's
         "glEnable(0x0BE2)", "glDisable(0x0B71)", "glViewport(1, 2, 3, 4)", "glScissor(5, 6, 7, 8)",
         "glDisableVertexAttribArray(0)", "glBindBuffer(0x8892, 14)",

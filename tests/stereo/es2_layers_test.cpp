@@ -12,6 +12,7 @@
 #include <string>
 #include <utility>
 
+#include "egl/current_context.h"
 #include "stereo/es2_scaled_layer.h"
 #include "stereo/es2_stereo_layer.h"
 #include "stereo/eye_texture.h"
@@ -317,7 +318,7 @@ TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
     AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffers, 1, {22});
     m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);  // makes the eye textures
     // The vendor gave both the same names; eye 1's texture is told apart here.
-    Manager().m_eye_textures->m_eyes[1].m_texture = 31;
+    Manager().m_eye_textures->Find(ovo::CurrentContext())->m_eyes[1].m_texture = 31;
     ResetRecorder();
     m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
     // Both copies sample texture 5 (still bound) into the eye textures' framebuffer; the
@@ -337,6 +338,35 @@ TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
                     "glBindFramebuffer", "glDrawArrays", "glBindTexture", "glUniform2f",
                     "glStencilFunc"}),
               expected);
+}
+
+// The eye textures belong to the context that drew: made there once, used there again
+// after other contexts drew, and deleted in it, before the vendor destroys it.
+TEST_F(TrackedLayerTest, EachContextKeepsItsOwnEyeTexturesUntilItEnds) {
+    Interleave(true);
+    MakeRenderTexture();
+    m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 0);
+    AnswerResult(ovo::GL_ENTRY_glCreateProgram, 0, 23);
+    AnswerIntegers(ovo::GL_ENTRY_glGetProgramiv, GL_LINK_STATUS, {GL_TRUE});
+    const EGLContext first = ovo::CurrentContext();
+    const EGLContext second = m_egl.CreateContext(2);
+    const std::pair<EGLContext, size_t> draws[] = {{first, 2}, {second, 2}, {first, 0}, {second, 0}};
+    for (auto [context, textures_made] : draws) {
+        ASSERT_EQ(m_egl.MakeCurrent(context), EGL_TRUE);
+        ResetRecorder();
+        m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        EXPECT_EQ(Only({"glGenTextures"}).size(), textures_made);
+    }
+    ResetRecorder();
+    ASSERT_NE(eglDestroyContext(m_egl.m_display, first), EGL_FALSE);
+    const std::string display = FormatHandle(m_egl.m_display);
+    const Calls expected = {
+        "eglMakeCurrent(" + display + ", null, null, " + FormatHandle(first) + ")",
+        "glDeleteFramebuffers(1, ptr)", "glDeleteTextures(1, ptr)", "glDeleteFramebuffers(1, ptr)",
+        "glDeleteTextures(1, ptr)", "glDeleteProgram(23)",
+        "eglMakeCurrent(" + display + ", 0x5000, 0x5000, " + FormatHandle(second) + ")",
+        "eglDestroyContext(" + display + ", " + FormatHandle(first) + ")"};
+    EXPECT_EQ(RecordedCalls(true), expected);
 }
 
 TEST_F(TrackedLayerTest, ClearsCoverTheDoubleWidth) {

@@ -44,7 +44,7 @@ protected:
 
     // Interleaving on (with the default eye swap) or off.
     static void Interleave(bool on) {
-        if (on && Manager().m_composer == nullptr) Manager().m_composer = new ovo::CompositionRenderer(0, 1);
+        if (on && Manager().m_composer == nullptr) Manager().m_composer = new ovo::CompositionRenderer(1);
         Manager().m_interleave = on;
     }
 

@@ -81,9 +81,18 @@ inline std::string FormatArgument(uint64_t bits, uint8_t kind) {
     return text;
 }
 
-// Every GL call recorded since the last reset, oldest first, as "glName(arguments)". When
-// the log has overflowed, a first line says how many calls it no longer holds.
-inline std::vector<std::string> RecordedGlCalls() {
+// EGL handles in hex, so that contexts and surfaces can be told apart.
+inline std::string FormatHandle(const void* handle) {
+    if (handle == nullptr) return "null";
+    char text[32];
+    std::snprintf(text, sizeof(text), "0x%" PRIxPTR, reinterpret_cast<uintptr_t>(handle));
+    return text;
+}
+
+// Every call recorded since the last reset, oldest first, as "glName(arguments)", with EGL
+// calls too when `with_egl`. When the log has overflowed, a first line says how many calls
+// it no longer holds.
+inline std::vector<std::string> RecordedCalls(bool with_egl) {
     const RecorderState& state = *RecorderGetState();
     std::vector<std::string> calls;
     uint32_t first = 0;
@@ -93,16 +102,23 @@ inline std::vector<std::string> RecordedGlCalls() {
     }
     for (uint32_t number = first; number < state.m_call_count; ++number) {
         const RecordedCall& call = state.m_calls[number % RECORDER_CAPACITY];
-        if (call.m_api == RECORDER_API_EGL) continue;
-        std::string text = std::string(ovo::GlEntryTable[call.m_index]) + "(";
+        const bool egl = call.m_api == RECORDER_API_EGL;
+        if (egl && !with_egl) continue;
+        std::string text = std::string(egl ? ovo::EglEntryTable[call.m_index]
+                                           : ovo::GlEntryTable[call.m_index]) + "(";
         for (uint32_t position = 0; position < call.m_argument_count; ++position) {
             if (position > 0) text += ", ";
-            text += FormatArgument(call.m_arguments[position], call.m_kinds[position]);
+            const uint64_t bits = call.m_arguments[position];
+            text += egl && call.m_kinds[position] == RECORDER_ARGUMENT_POINTER
+                        ? FormatHandle(reinterpret_cast<const void*>(static_cast<uintptr_t>(bits)))
+                        : FormatArgument(bits, call.m_kinds[position]);
         }
         calls.push_back(text + ")");
     }
     return calls;
 }
+
+inline std::vector<std::string> RecordedGlCalls() { return RecordedCalls(false); }
 
 }  // namespace recorded_calls
 

@@ -45,6 +45,15 @@ struct Answer<ovo::EGL_ENTRY_eglGetProcAddress> {
     }
 };
 
+// Each context a handle of its own, the first one the recorded result.
+template <>
+struct Answer<ovo::EGL_ENTRY_eglCreateContext> {
+    static EGLContext Give(EGLContext recorded, EGLDisplay, EGLConfig, EGLContext, const EGLint*) {
+        static uintptr_t created = 0;
+        return reinterpret_cast<EGLContext>(reinterpret_cast<uintptr_t>(recorded) + 0x100 * created++);
+    }
+};
+
 template <>
 struct Answer<ovo::EGL_ENTRY_eglMakeCurrent> {
     static EGLBoolean Give(EGLBoolean, EGLDisplay, EGLSurface, EGLSurface, EGLContext) {

@@ -10,8 +10,8 @@
 // llvmpipe then queues frame after frame, and even with a flush what its scenes in flight
 // hold moves the readings by up to 200 MB (figures in README.md, "Soak").
 //
-// Every COUNT_REPORT_EVERY-th eglSwapBuffers appends one line to the file named by
-// OVO_GL_COUNT:
+// Every COUNT_REPORT_EVERY-th eglSwapBuffers (or every OVO_GL_COUNT_EVERY-th) appends one
+// line to the file named by OVO_GL_COUNT:
 //   swap N rss_kb K programs P shaders S textures T framebuffers F renderbuffers R buffers B
 // and so does the end of the process, after everything else has run, with the number of
 // names ever made (of all kinds) in front:
@@ -39,6 +39,7 @@ using ovo_gl_count::LiveObjects;
 using ovo_gl_count::ObjectKind;
 
 constexpr char COUNT_FILE_VARIABLE[] = "OVO_GL_COUNT";
+constexpr char COUNT_EVERY_VARIABLE[] = "OVO_GL_COUNT_EVERY";
 // Late enough that the start-up frames have made what a game keeps.
 constexpr unsigned long COUNT_REPORT_EVERY = 500;
 constexpr size_t COUNT_LINE_CAPACITY = 512;
@@ -98,6 +99,13 @@ size_t FormatReport(const char* event, char* line, size_t capacity) {
     return static_cast<size_t>(length);
 }
 
+// Short runs (a test's) report more often.
+unsigned long ReportEvery() {
+    const char* text = std::getenv(COUNT_EVERY_VARIABLE);
+    const unsigned long every = text != nullptr ? std::strtoul(text, nullptr, 10) : 0;
+    return every > 0 ? every : COUNT_REPORT_EVERY;
+}
+
 void AppendReport(const char* path, const char* event) {
     char line[COUNT_LINE_CAPACITY];
     const size_t length = FormatReport(event, line, sizeof(line));
@@ -129,11 +137,12 @@ GL_COUNT_EXPORT EGLBoolean EGLAPIENTRY eglSwapBuffers(EGLDisplay display, EGLSur
     static const auto mesa = Mesa<decltype(&eglSwapBuffers)>("eglSwapBuffers");
     static const auto finish = Mesa<decltype(&glFinish)>("glFinish");
     static std::atomic<unsigned long> swaps{0};
+    static const unsigned long every = ReportEvery();
     finish();
     const EGLBoolean swapped = mesa(display, surface);
     const unsigned long swap = ++swaps;
     const char* path = std::getenv(COUNT_FILE_VARIABLE);
-    if (path != nullptr && path[0] != '\0' && swap % COUNT_REPORT_EVERY == 0) {
+    if (path != nullptr && path[0] != '\0' && swap % every == 0) {
         char event[COUNT_EVENT_CAPACITY];
         std::snprintf(event, sizeof(event), "swap %lu", swap);
         AppendReport(path, event);

@@ -1,0 +1,231 @@
+// The library's own objects of a context on Mesa: deleted when the application ends the
+// context, in it, with the thread's own binding back afterwards; and eglGetError after each
+// of the application's EGL calls reports what Mesa reports for the same calls made without
+// the library.
+#include <EGL/egl.h>
+#include <GLES2/gl2.h>
+#include <gtest/gtest.h>
+
+#include <thread>
+#include <vector>
+
+#include "core/raw_egl.h"
+#include "core/stereo_manager.h"
+#include "egl/current_context.h"
+#include "present/composition_renderer.h"
+#include "stereo/es2_stereo_layer.h"
+#include "stereo/eye_texture.h"
+#include "support/mesa_context.h"
+#include "support/render_texture_draw.h"
+
+namespace {
+
+// The library's eye texture names of one context.
+struct EyeNames {
+    std::vector<GLuint> m_textures;
+    std::vector<GLuint> m_framebuffers;
+    GLuint m_program = 0;
+};
+
+// The application's EGL calls, through the library or straight to Mesa.
+struct EglCalls {
+    decltype(&::eglCreateContext) m_create;
+    decltype(&::eglMakeCurrent) m_make_current;
+    decltype(&::eglDestroyContext) m_destroy;
+    decltype(&::eglTerminate) m_terminate;
+    decltype(&::eglSwapBuffers) m_swap;
+};
+const EglCalls LIBRARY = {&::eglCreateContext, &::eglMakeCurrent, &::eglDestroyContext,
+                          &::eglTerminate, &::eglSwapBuffers};
+const EglCalls MESA = {&ovo::vendor_egl::eglCreateContext, &ovo::vendor_egl::eglMakeCurrent,
+                       &ovo::vendor_egl::eglDestroyContext, &ovo::vendor_egl::eglTerminate,
+                       &ovo::vendor_egl::eglSwapBuffers};
+
+// One run of a scenario: through the library, which draws a render texture before each
+// swap (so that it keeps eye textures and a mask program), or straight to Mesa, which
+// only swaps. eglGetError is read after each of the application's EGL calls.
+class EglRun {
+public:
+    explicit EglRun(bool library) : m_library(library), m_egl(library ? LIBRARY : MESA) {
+        m_session.Open(2);
+        for (EGLSurface& surface : m_surfaces) surface = m_session.CreateSurface(16, 16);
+    }
+
+    EGLContext Create(EGLContext share = EGL_NO_CONTEXT) {
+        const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, 2, EGL_NONE};
+        return Noted(m_egl.m_create(m_session.m_display, m_session.m_config, share, version));
+    }
+    // With the surface of the main thread (0) or of another (1): a surface is current on
+    // one thread at most.
+    void MakeCurrent(EGLContext context, int thread = 0) {
+        const EGLSurface surface = context != EGL_NO_CONTEXT ? m_surfaces[thread] : EGL_NO_SURFACE;
+        Noted(m_egl.m_make_current(m_session.m_display, surface, surface, context));
+    }
+    void Destroy(EGLContext context) { Noted(m_egl.m_destroy(m_session.m_display, context)); }
+    void Terminate() { Noted(m_egl.m_terminate(m_session.m_display)); }
+    // A frame, swapped. The library's eye textures of the current context that the draw
+    // left, if any.
+    EyeNames Draw(int thread = 0) {
+        if (m_library) {
+            RenderTextureDraw draw;
+            draw.Create(8);
+            draw.DrawToWindow();
+        }
+        Noted(m_egl.m_swap(m_session.m_display, m_surfaces[thread]));
+        if (!m_library) return {};
+        const ovo::EyeTexturePair* eyes =
+            ovo::StereoManager::instance().m_eye_textures->Find(ovo::CurrentContext());
+        if (eyes == nullptr) return {};
+        EyeNames names;
+        for (const ovo::EyeTexture& eye : eyes->m_eyes) {
+            names.m_textures.push_back(eye.m_texture);
+            names.m_framebuffers.push_back(eye.m_framebuffer);
+        }
+        names.m_program = eyes->m_eyes[0].m_program;
+        return names;
+    }
+    // Whether Mesa still has any of `names`, asked in the current context.
+    static bool AnyAlive(const EyeNames& names) {
+        bool alive = names.m_program != 0 && glIsProgram(names.m_program);
+        for (GLuint texture : names.m_textures) alive = alive || glIsTexture(texture);
+        for (GLuint framebuffer : names.m_framebuffers) alive = alive || glIsFramebuffer(framebuffer);
+        return alive;
+    }
+    // The thread is bound to `context` and this run's surface, as the application left it.
+    void ExpectBoundTo(EGLContext context) const {
+        EXPECT_EQ(ovo::vendor_egl::eglGetCurrentContext(), context);
+        EXPECT_EQ(ovo::vendor_egl::eglGetCurrentSurface(EGL_DRAW), m_surfaces[0]);
+        EXPECT_EQ(ovo::vendor_egl::eglGetCurrentSurface(EGL_READ), m_surfaces[0]);
+    }
+
+    bool m_library;
+    std::vector<EGLint> m_errors;
+
+private:
+    template <typename Result>
+    Result Noted(Result result) {
+        m_errors.push_back(eglGetError());
+        return result;
+    }
+
+    EglCalls m_egl;
+    MesaSession m_session;
+    EGLSurface m_surfaces[2] = {};
+};
+
+class ContextObjectsOnMesa : public ::testing::Test {
+protected:
+    void SetUp() override {
+        ovo::StereoManager& manager = ovo::StereoManager::instance();
+        delete manager.m_layer;
+        manager.m_layer = new ovo::Es2StereoLayer(ovo::LAYER_SUBMODE_TRACKED);
+        manager.m_es2_layer_installed = true;
+        manager.m_composer = new ovo::CompositionRenderer(1);  // released at exit
+        manager.m_interleave = true;
+    }
+
+    // `scenario` through the library, then straight to Mesa: the same errors.
+    template <typename Scenario>
+    void ExpectMesasErrors(Scenario scenario) {
+        std::vector<EGLint> errors[2];
+        for (bool library : {true, false}) {
+            EglRun run(library);
+            ASSERT_NO_FATAL_FAILURE(scenario(run));
+            ASSERT_GT(run.m_errors.size(), 2u);
+            errors[library] = run.m_errors;
+        }
+        EXPECT_EQ(errors[true], errors[false]);
+    }
+};
+
+TEST_F(ContextObjectsOnMesa, AContextEndedWhileAnotherIsCurrent) {
+    ExpectMesasErrors([](EglRun& run) {
+        const EGLContext own = run.Create();
+        const EGLContext ended = run.Create(own);  // its textures stay visible in `own`
+        run.MakeCurrent(ended);
+        const EyeNames names = run.Draw();
+        run.MakeCurrent(own);
+        run.Draw();
+        if (run.m_library) {
+            EXPECT_TRUE(EglRun::AnyAlive(names));
+        }
+        run.Destroy(ended);
+        if (run.m_library) {
+            run.ExpectBoundTo(own);
+            EXPECT_FALSE(EglRun::AnyAlive(names));
+            EXPECT_EQ(glGetError(), GL_NO_ERROR);
+        }
+        run.Destroy(ended);  // no longer a context
+        run.MakeCurrent(EGL_NO_CONTEXT);
+        run.Destroy(own);
+    });
+}
+
+TEST_F(ContextObjectsOnMesa, AContextEndedWhileCurrent) {
+    ExpectMesasErrors([](EglRun& run) {
+        const EGLContext ended = run.Create();
+        run.MakeCurrent(ended);
+        const EyeNames names = run.Draw();
+        if (run.m_library) {
+            EXPECT_TRUE(EglRun::AnyAlive(names));
+        }
+        run.Destroy(ended);
+        if (run.m_library) {
+            run.ExpectBoundTo(ended);  // until the thread leaves it
+            EXPECT_FALSE(EglRun::AnyAlive(names));
+        }
+        // Still current: the next frame's objects are the frame's own.
+        run.Draw();
+        if (run.m_library) {
+            EXPECT_EQ(glGetError(), GL_NO_ERROR);
+        }
+        run.MakeCurrent(EGL_NO_CONTEXT);
+    });
+}
+
+// A context current on another thread cannot be made current here: its objects are left
+// to the driver, and the application learns of no refusal.
+TEST_F(ContextObjectsOnMesa, AContextEndedWhileCurrentOnAnotherThread) {
+    ExpectMesasErrors([](EglRun& run) {
+        const EGLContext own = run.Create();
+        const EGLContext elsewhere = run.Create(own);
+        EyeNames names;
+        std::thread([&] {
+            run.MakeCurrent(elsewhere, 1);
+            names = run.Draw(1);
+        }).join();
+        run.MakeCurrent(own);
+        run.Destroy(elsewhere);
+        if (run.m_library) {
+            run.ExpectBoundTo(own);
+            EXPECT_TRUE(EglRun::AnyAlive(names)) << "forgotten, not deleted from another context";
+        }
+        run.MakeCurrent(EGL_NO_CONTEXT);
+    });
+}
+
+TEST_F(ContextObjectsOnMesa, TerminatingADisplayWithSeveralContexts) {
+    ExpectMesasErrors([](EglRun& run) {
+        const EGLContext own = run.Create();
+        const EGLContext sharing = run.Create(own);
+        const EGLContext alone = run.Create();
+        EyeNames names[2];
+        run.MakeCurrent(alone);
+        run.Draw();
+        run.MakeCurrent(sharing);
+        names[0] = run.Draw();
+        run.MakeCurrent(own);
+        names[1] = run.Draw();
+        if (run.m_library) {
+            for (const EyeNames& each : names) EXPECT_TRUE(EglRun::AnyAlive(each));
+        }
+        run.Terminate();
+        if (run.m_library) {
+            run.ExpectBoundTo(own);  // the display's contexts end as the thread leaves them
+            for (const EyeNames& each : names) EXPECT_FALSE(EglRun::AnyAlive(each));
+        }
+        run.MakeCurrent(EGL_NO_CONTEXT);
+    });
+}
+
+}  // namespace
