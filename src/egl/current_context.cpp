@@ -4,7 +4,7 @@ namespace ovo {
 
 namespace {
 thread_local EglBinding g_binding = {EGL_NO_DISPLAY, EGL_NO_SURFACE, EGL_NO_SURFACE,
-                                     EGL_NO_CONTEXT, false};
+                                     EGL_NO_CONTEXT, false, false};
 }  // namespace
 
 const EglBinding& CurrentBinding() { return g_binding; }
@@ -13,8 +13,13 @@ EGLContext CurrentContext() { return g_binding.m_context; }
 
 void NoteCurrentBinding(EGLDisplay display, EGLSurface draw, EGLSurface read,
                         EGLContext context) {
-    g_binding = EglBinding{display, draw, read, context, false};
+    // The same draw surface made current again keeps its stencil, and so its mask.
+    const bool masked = g_binding.m_surface_masked && context != EGL_NO_CONTEXT &&
+                        g_binding.m_context != EGL_NO_CONTEXT && draw == g_binding.m_draw;
+    g_binding = EglBinding{display, draw, read, context, false, masked};
 }
+
+void NoteSurfaceMasked() { g_binding.m_surface_masked = true; }
 
 void NoteEndedHandle(EGLDisplay display, const void* handle) {
     if (g_binding.m_context == EGL_NO_CONTEXT || display != g_binding.m_display) return;

@@ -55,7 +55,16 @@ void CompositionRenderer::Present(StereoManager& manager) {
         }
         g_composition_first_present = false;
     }
-    DrawMask(manager);
+    DrawMask(manager, GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT | GL_STENCIL_BUFFER_BIT);
+}
+
+void CompositionRenderer::MaskNewSurface(const StereoManager& manager) {
+    if (g_composition_first_present) return;
+    // Only the window's stencil: the application's own framebuffer has no mask to hold.
+    GLint framebuffer = 0;
+    raw::glGetIntegerv(GL_FRAMEBUFFER_BINDING, &framebuffer);
+    if (framebuffer != 0) return;
+    DrawMask(manager, GL_STENCIL_BUFFER_BIT);
 }
 
 void CompositionRenderer::SetMaskTest(int on) const {
@@ -123,10 +132,10 @@ void CompositionRenderer::BuildLinesGl1(const StereoProfileFields& profile) {
 }
 
 // Leaves the stencil 0 on the lines and 1 elsewhere; no colour or depth reaches the lines.
-void CompositionRenderer::DrawMask(const StereoManager& manager) {
+void CompositionRenderer::DrawMask(const StereoManager& manager, GLbitfield clear_bits) {
     raw::glEnable(GL_STENCIL_TEST);
     raw::glClearStencil(1);
-    raw::glClear(GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT | GL_STENCIL_BUFFER_BIT);
+    raw::glClear(clear_bits);
     raw::glStencilFunc(GL_NEVER, 0, 1);
     raw::glStencilOp(GL_REPLACE, GL_KEEP, GL_KEEP);
     const TargetSize size = MaskSize(*manager.m_profile);
@@ -138,6 +147,7 @@ void CompositionRenderer::DrawMask(const StereoManager& manager) {
     }
     raw::glStencilOp(GL_KEEP, GL_KEEP, GL_KEEP);
     raw::glDisable(GL_STENCIL_TEST);
+    NoteSurfaceMasked();
 }
 
 }  // namespace ovo

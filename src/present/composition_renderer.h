@@ -35,6 +35,10 @@ public:
     // first call in the process also starts the panel's composition and builds the lines,
     // for the drawing path and target size of that moment.
     void Present(StereoManager& manager);
+    // Before the first stereo draw into a window surface that was made current since its
+    // last swap: its stencil gets the mask, its colour and depth stay. Nothing before the
+    // first swap of the process, which builds the lines.
+    void MaskNewSurface(const StereoManager& manager);
     // on == 1 switches the stencil test on, anything else off.
     void SetMaskTest(int on) const;
     // Restricts drawing to the columns of `eye`.
@@ -62,7 +66,8 @@ private:
     void BuildLinesGl1(const StereoProfileFields& profile);
     // Allocates room for the lines; false (and no lines) when memory is short.
     bool AllocateLines(const StereoProfileFields& profile);
-    void DrawMask(const StereoManager& manager);
+    // Clears `clear_bits` (the stencil to 1 among them) and draws the lines.
+    void DrawMask(const StereoManager& manager, GLbitfield clear_bits);
     void DrawLinesGl2(GLsizei width, GLsizei height, uint32_t share_group);
     void DrawLinesGl1(GLsizei width, GLsizei height) const;
 

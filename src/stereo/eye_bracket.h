@@ -2,15 +2,20 @@
 #define OVO_STEREO_EYE_BRACKET_H
 
 #include "core/stereo_manager.h"
+#include "egl/current_context.h"
 #include "present/composition_renderer.h"
 #include "stereo/draw_call.h"
 
 namespace ovo {
 
 // The first half of the eye bracket: the mask test goes on before anything of the pair.
-// Layers that flush the overlay do so between this and DrawEyePair.
+// Layers that flush the overlay do so between this and DrawEyePair. A surface that was
+// made current since its last swap (the player returned, the device turned) gets its mask
+// first, so that its first frame is stereo too.
 inline void BeginEyeMask(StereoManager& manager) {
-    if (manager.m_interleave) manager.m_composer->SetMaskTest(1);
+    if (!manager.m_interleave) return;
+    if (!CurrentBinding().m_surface_masked) manager.m_composer->MaskNewSurface(manager);
+    manager.m_composer->SetMaskTest(1);
 }
 
 // The rest of the bracket: per eye, `setup(eye)`, the eye's stencil reference, the
