@@ -1,14 +1,16 @@
 #!/usr/bin/env bash
 # Puts the vertex shaders that the depth-shift corpus test compiles below DIR (the build
-# tree's piglit/ unless configured otherwise): Debian's piglit package is fetched once with
-# `apt-get download` (about 34 MB, kept in DIR) and only the GLSL ES 1.00 tests and the
-# other .vert files are taken out of it, never the 2 GB the package installs.
+# tree's piglit/ unless configured otherwise), and the one OpenGL ES 1.x program that the
+# third-party tests run with the libraries it needs: Debian's piglit package is fetched once
+# with `apt-get download` (about 34 MB, kept in DIR) and only the GLSL ES 1.00 tests, the
+# other .vert files and that program are taken out of it, never the 2 GB the package
+# installs.
 #   scripts/fetch-piglit-corpus.sh DIR
 # Does nothing when DIR already holds the extract. Fails, saying why, when the package
 # cannot be had; the corpus test then fails too.
 set -euo pipefail
 dir="${1:?usage: fetch-piglit-corpus.sh DIR}"
-stamp="$dir/extracted"
+stamp="$dir/extracted-with-programs"
 [ -e "$stamp" ] && exit 0
 
 fail() {
@@ -36,11 +38,13 @@ fi
 extract="$(mktemp -d "$dir/extract.XXXXXX")"
 dpkg-deb --fsys-tarfile "${debs[0]}" |
   tar -x -C "$extract" --wildcards './usr/lib/*/piglit/tests/spec/glsl-es-1.00/*' \
-    './usr/lib/*/piglit/tests/spec/*.vert' ||
-  fail "could not extract the shaders from ${debs[0]} (delete it to fetch it again)"
-tests=("$extract"/usr/lib/*/piglit/tests)
-[ -d "${tests[0]}/spec/glsl-es-1.00" ] || fail "${debs[0]} holds no tests/spec/glsl-es-1.00"
-rm -rf "$dir/tests"
-mv "${tests[0]}" "$dir/tests"
+    './usr/lib/*/piglit/tests/spec/*.vert' './usr/lib/*/piglit/bin/arb_point_sprite-checkerboard_gles1' \
+    './usr/lib/*/piglit/lib/libpiglitutil.so*' './usr/lib/*/piglit/lib/libpiglitutil_gles1.so*' ||
+  fail "could not extract the shaders and the program from ${debs[0]} (delete it to fetch it again)"
+piglit=("$extract"/usr/lib/*/piglit)
+[ -d "${piglit[0]}/tests/spec/glsl-es-1.00" ] || fail "${debs[0]} holds no tests/spec/glsl-es-1.00"
+[ -x "${piglit[0]}/bin/arb_point_sprite-checkerboard_gles1" ] || fail "${debs[0]} holds no arb_point_sprite-checkerboard_gles1"
+rm -rf "$dir/tests" "$dir/bin" "$dir/lib"
+mv "${piglit[0]}/tests" "${piglit[0]}/bin" "${piglit[0]}/lib" "$dir/"
 touch "$stamp"
 echo "fetch-piglit-corpus: extracted $(find "$dir/tests" -type f | wc -l) files into $dir/tests"

@@ -23,6 +23,10 @@ struct DisparityPrediction {
 // `window_width` / 2 screen pixels per unit, and an eye pixel is two screen pixels.
 DisparityPrediction PredictDisparity(float eye_distance, float eye_angle, int window_width);
 
+// An OpenGL ES 1.x flat draw moves by the eye shift s in clip space, eye 0 right and eye 1
+// left: each eye s, the eyes 2 s apart, in front of the screen.
+DisparityPrediction PredictFlatShift(float eye_shift, int window_width);
+
 // How far apart a frame's eyes lie, in eye pixels: the largest separation measured, and
 // the largest departure from none (both 0 when nothing could be measured).
 struct FrameDepth {

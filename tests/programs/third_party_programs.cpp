@@ -14,46 +14,45 @@ constexpr char SDL_TESTS[] = "/usr/libexec/installed-tests/SDL2";
 struct Glmark2Benchmark {
     const char* m_description;
     SceneKind m_scene;
-    bool m_fast;
 };
 
 const Glmark2Benchmark GLMARK2_BENCHMARKS[] = {
-    {"build:use-vbo=false", SCENE_3D, true},
-    {"build:use-vbo=true", SCENE_3D, false},
-    {"texture:texture-filter=nearest", SCENE_3D, false},
-    {"texture:texture-filter=linear", SCENE_3D, false},
-    {"texture:texture-filter=mipmap", SCENE_3D, false},
-    {"shading:shading=gouraud", SCENE_3D, true},
-    {"shading:shading=blinn-phong-inf", SCENE_3D, false},
-    {"shading:shading=phong", SCENE_3D, true},
-    {"shading:shading=cel", SCENE_3D, false},
-    {"bump:bump-render=high-poly", SCENE_3D, false},
-    {"bump:bump-render=normals", SCENE_3D, false},
-    {"bump:bump-render=height", SCENE_3D, false},
-    {"effect2d:kernel=0,1,0;1,-4,1;0,1,0;", SCENE_FLAT, false},
-    {"effect2d:kernel=1,1,1,1,1;1,1,1,1,1;1,1,1,1,1;", SCENE_FLAT, false},
-    {"pulsar:light=false:quads=5:texture=false", SCENE_3D, false},
-    {"desktop:blur-radius=5:effect=blur:passes=1:separable=true:windows=4", SCENE_OFFSCREEN, false},
-    {"desktop:effect=shadow:windows=4", SCENE_OFFSCREEN, false},
+    {"build:use-vbo=false", SCENE_3D},
+    {"build:use-vbo=true", SCENE_3D},
+    {"texture:texture-filter=nearest", SCENE_3D},
+    {"texture:texture-filter=linear", SCENE_3D},
+    {"texture:texture-filter=mipmap", SCENE_3D},
+    {"shading:shading=gouraud", SCENE_3D},
+    {"shading:shading=blinn-phong-inf", SCENE_3D},
+    {"shading:shading=phong", SCENE_3D},
+    {"shading:shading=cel", SCENE_3D},
+    {"bump:bump-render=high-poly", SCENE_3D},
+    {"bump:bump-render=normals", SCENE_3D},
+    {"bump:bump-render=height", SCENE_3D},
+    {"effect2d:kernel=0,1,0;1,-4,1;0,1,0;", SCENE_FLAT},
+    {"effect2d:kernel=1,1,1,1,1;1,1,1,1,1;1,1,1,1,1;", SCENE_FLAT},
+    {"pulsar:light=false:quads=5:texture=false", SCENE_3D},
+    {"desktop:blur-radius=5:effect=blur:passes=1:separable=true:windows=4", SCENE_OFFSCREEN},
+    {"desktop:effect=shadow:windows=4", SCENE_OFFSCREEN},
     {"buffer:columns=200:interleave=false:update-dispersion=0.9:update-fraction=0.5:update-method=map",
-     SCENE_3D_THIN_LINES, false},
+     SCENE_3D_THIN_LINES},
     {"buffer:columns=200:interleave=false:update-dispersion=0.9:update-fraction=0.5:update-method=subdata",
-     SCENE_3D_THIN_LINES, false},
+     SCENE_3D_THIN_LINES},
     {"buffer:columns=200:interleave=true:update-dispersion=0.9:update-fraction=0.5:update-method=map",
-     SCENE_3D_THIN_LINES, false},
-    {"ideas:speed=duration", SCENE_3D, false},
-    {"jellyfish", SCENE_3D, false},
-    {"terrain", SCENE_OFFSCREEN, false},
-    {"shadow", SCENE_3D, false},
-    {"refract", SCENE_3D, false},
-    {"conditionals:fragment-steps=0:vertex-steps=0", SCENE_3D_SCREEN_COLOURED, false},
-    {"conditionals:fragment-steps=5:vertex-steps=0", SCENE_3D_SCREEN_COLOURED, false},
-    {"conditionals:fragment-steps=0:vertex-steps=5", SCENE_3D_SCREEN_COLOURED, false},
-    {"function:fragment-complexity=low:fragment-steps=5", SCENE_3D_SCREEN_COLOURED, false},
-    {"function:fragment-complexity=medium:fragment-steps=5", SCENE_3D_SCREEN_COLOURED, false},
-    {"loop:fragment-loop=false:fragment-steps=5:vertex-steps=5", SCENE_3D_SCREEN_COLOURED, false},
-    {"loop:fragment-steps=5:fragment-uniform=false:vertex-steps=5", SCENE_3D_SCREEN_COLOURED, false},
-    {"loop:fragment-steps=5:fragment-uniform=true:vertex-steps=5", SCENE_3D_SCREEN_COLOURED, false},
+     SCENE_3D_THIN_LINES},
+    {"ideas:speed=duration", SCENE_3D},
+    {"jellyfish", SCENE_3D},
+    {"terrain", SCENE_OFFSCREEN},
+    {"shadow", SCENE_3D},
+    {"refract", SCENE_3D},
+    {"conditionals:fragment-steps=0:vertex-steps=0", SCENE_3D_SCREEN_COLOURED},
+    {"conditionals:fragment-steps=5:vertex-steps=0", SCENE_3D_SCREEN_COLOURED},
+    {"conditionals:fragment-steps=0:vertex-steps=5", SCENE_3D_SCREEN_COLOURED},
+    {"function:fragment-complexity=low:fragment-steps=5", SCENE_3D_SCREEN_COLOURED},
+    {"function:fragment-complexity=medium:fragment-steps=5", SCENE_3D_SCREEN_COLOURED},
+    {"loop:fragment-loop=false:fragment-steps=5:vertex-steps=5", SCENE_3D_SCREEN_COLOURED},
+    {"loop:fragment-steps=5:fragment-uniform=false:vertex-steps=5", SCENE_3D_SCREEN_COLOURED},
+    {"loop:fragment-steps=5:fragment-uniform=true:vertex-steps=5", SCENE_3D_SCREEN_COLOURED},
 };
 
 // glmark2's scenes animate by the clock: half a second a frame takes each well into its
@@ -91,26 +90,31 @@ std::vector<ThirdPartyProgram> ThirdPartyPrograms() {
         programs.push_back({"glmark2_" + TestName(description),
                             {"glmark2-es2", "-b", description + ":nframes=3", "--size", WINDOW_SIZE,
                              "--visual-config", "stencil=8"},
-                            "", {GLMARK2_CLOCK_STEP}, 3, true, REDRAW_CONTINUOUS, benchmark.m_scene,
-                            benchmark.m_fast});
+                            "", {GLMARK2_CLOCK_STEP}, 3, true, REDRAW_CONTINUOUS, benchmark.m_scene, ""});
     }
     programs.push_back({"es2gears_x11", {"es2gears_x11"}, "", {}, 4, false, REDRAW_CONTINUOUS,
-                        SCENE_3D, false});
-    programs.push_back({"es2tri", {"es2tri"}, "", {}, 2, false, REDRAW_ON_EXPOSE, SCENE_FLAT, false});
+                        SCENE_3D, ""});
+    programs.push_back({"es2tri", {"es2tri"}, "", {}, 2, false, REDRAW_ON_EXPOSE, SCENE_FLAT, ""});
     // SDL picks GLX for an OpenGL ES context on X11 when the X server offers it; on a
     // device it always takes EGL, and so must it here to reach the library.
     const std::vector<std::string> sdl_environment = {"SDL_VIDEO_X11_FORCE_EGL=1"};
     programs.push_back({"testgles2", {"./testgles2", "--geometry", WINDOW_SIZE}, SDL_TESTS,
-                        sdl_environment, 4, false, REDRAW_CONTINUOUS, SCENE_3D, true});
+                        sdl_environment, 4, false, REDRAW_CONTINUOUS, SCENE_3D, ""});
     // Some tests make their renderer without asking for one by name: the hint chooses it.
     std::vector<std::string> renderer_environment = sdl_environment;
     renderer_environment.push_back("SDL_RENDER_DRIVER=opengles2");
     for (const char* test : SDL_RENDERER_TESTS) {
         programs.push_back({std::string("sdl_") + test,
                             {std::string("./") + test, "--renderer", "opengles2", "--geometry", WINDOW_SIZE},
-                            SDL_TESTS, renderer_environment, 4, false, REDRAW_CONTINUOUS, SCENE_FLAT,
-                            false});
+                            SDL_TESTS, renderer_environment, 4, false, REDRAW_CONTINUOUS, SCENE_FLAT, ""});
     }
+    // OpenGL ES 1.x: piglit's point-sprite checkerboards, taken out of Debian's piglit
+    // package (scripts/fetch-piglit-corpus.sh). It draws when its window is exposed, and it
+    // opens libGLESv1_CM.so.1 itself, after eglGetDisplay.
+    programs.push_back({"piglit_arb_point_sprite_checkerboard_gles1",
+                        {OVO_PIGLIT_DIR "/bin/arb_point_sprite-checkerboard_gles1"}, "",
+                        {"PIGLIT_PLATFORM=x11_egl"}, 2, false, REDRAW_ON_EXPOSE, SCENE_ES1_FLAT,
+                        OVO_PIGLIT_DIR "/lib"});
     return programs;
 }
 

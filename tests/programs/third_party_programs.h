@@ -24,6 +24,9 @@ enum SceneKind {
     SCENE_OFFSCREEN,
     // Everything at clip-space depth 0 (2D renderers, full-screen effects): flat.
     SCENE_FLAT,
+    // OpenGL ES 1.x drawing with a flat projection: each eye's draws move as a whole by the
+    // profile's eye shift, eye 0 right and eye 1 left, in front of the screen.
+    SCENE_ES1_FLAT,
 };
 
 // A real, unmodified OpenGL ES 2.0 program from Debian, as the suite starts it.
@@ -36,8 +39,8 @@ struct ThirdPartyProgram {
     bool m_stops_by_itself;
     RedrawKind m_redraw;
     SceneKind m_scene;
-    // In the test command's fast subset.
-    bool m_fast;
+    // A folder of libraries the program needs beyond the system's, or empty.
+    std::string m_libraries;
 };
 
 std::vector<ThirdPartyProgram> ThirdPartyPrograms();
