@@ -13,9 +13,12 @@ eye0_columns=even
 # Processor time per run with a profile: the panel refresh comes round every 0.1 s of it.
 cpu_seconds=1.0
 # profile -> the one sample it is made for; a profile not named here goes with every sample.
+# The third-party profile goes with a program that is not a sample (the last part below).
 declare -A profile_sample=([es1_scene_interleave]=es1_scene [es1_scene_overlay]=es1_scene
   [es1_sprites_listed]=es1_sprites [es2_scene_interleave]=es2_scene
-  [es2_scene_tracked]=es2_scene)
+  [es2_scene_tracked]=es2_scene [third_party_800x480]=glmark2)
+# A program nobody here wrote: glmark2's build scene, at the size of the third-party profile.
+glmark2_frames=60
 # profile -> the options its sample needs with it.
 declare -A profile_options=([es1_scene_overlay]="--size 1280x720")
 # profile -> the process name its sample runs under (else the program's path): the library
@@ -55,6 +58,8 @@ echo "Without a profile every call passes through unchanged:"
 rm -f "$installed_profile"
 for program in "$build"/examples/*_ovo; do
   sample="$(basename "$program" _ovo)"
+  # The lifecycle programs play the tests' scenarios; they are no samples to show.
+  [[ "$sample" != lifecycle_* ]] || continue
   # The library's Android log lines (standard error on a host) go to a file of their own.
   "$program" "$out/$sample.png" >/dev/null 2>"$out/$sample.log"
   "$build/examples/${sample}_mesa" "$out/${sample}_mesa.png" >/dev/null
@@ -88,6 +93,7 @@ for text in "$root"/examples/profiles/*.txt; do
   profile="$(basename "$text" .txt)"
   for program in "$build"/examples/*_ovo; do
     sample="$(basename "$program" _ovo)"
+    [[ "$sample" != lifecycle_* ]] || continue
     if [ -n "${profile_sample[$profile]:-}" ] && [ "${profile_sample[$profile]}" != "$sample" ]; then
       continue
     fi
@@ -138,5 +144,42 @@ for text in "$root"/examples/profiles/*.txt; do
     echo "    $files"
   done
 done
+
+echo "A program nobody here wrote, in stereo: glmark2-es2's build scene, through the capture library:"
+# It opens libEGL.so.1 and libGLESv2.so.2 (or the unversioned names) itself: a folder of
+# those names leads it to the library. It asks for a configuration without stencil unless
+# told otherwise; the library gives every configuration one for the column mask.
+libraries="$(mktemp -d)"
+xvfb_pid=""
+trap 'rm -rf "$libraries"; [ -z "$xvfb_pid" ] || kill "$xvfb_pid" 2>/dev/null' EXIT
+for name in libEGL.so.1 libEGL.so libGLESv2.so.2 libGLESv2.so libGLESv1_CM.so.1 libGLESv1_CM.so; do
+  ln -s "$capture_library/libGLES_ovo.so" "$libraries/$name"
+done
+# A private X server; it writes its display number once it takes clients.
+Xvfb -displayfd 3 -screen 0 1024x768x24 -nolisten tcp 3>"$libraries/display" >/dev/null 2>&1 &
+xvfb_pid=$!
+for _ in $(seq 200); do [ -s "$libraries/display" ] && break; sleep 0.1; done
+display_number="$(tr -d '\n' <"$libraries/display")"
+base="glmark2_build.third_party_800x480"
+if [ -z "$display_number" ]; then
+  echo "  glmark2-es2: Xvfb did not start"
+  status=1
+else
+  cp "$build/profiles/third_party_800x480.ovo" "$installed_profile"
+  if DISPLAY=":$display_number" LD_LIBRARY_PATH="$libraries" OVO_SWAP_CAPTURE="$out/$base.raw.png" \
+      glmark2-es2 -b "build:nframes=$glmark2_frames" --size 800x480 --visual-config stencil=8 \
+      >"$out/$base.log" 2>&1; then
+    files="out/demo/$base.raw.png (at the swap)"
+    for view in preview:sbs anaglyph:anaglyph; do
+      "$frames_tool" "${view%%:*}" "$out/$base.raw.png" --eye0-columns "$eye0_columns" \
+        -o "$out/$base.${view##*:}.png" && files+=", out/demo/$base.${view##*:}.png" || status=1
+    done
+    echo "  $(grep -o '\[build\].*' "$out/$base.log" | head -n 1)"
+    echo "    $files"
+  else
+    echo "  glmark2-es2 FAILED (out/demo/$base.log)"
+    status=1
+  fi
+fi
 rm -f "$installed_profile"
 exit $status
