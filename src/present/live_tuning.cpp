@@ -4,6 +4,7 @@
 
 #include "config/stereo_profile.h"
 #include "platform/device_path.h"
+#include "platform/regular_file.h"
 
 namespace ovo {
 
@@ -11,7 +12,7 @@ void ReadLiveTuning(StereoProfile& profile) {
     float values[5] = {0.0f, 0.0f, 0.0f, 0.0f, 0.0f};
     char path[DEVICE_PATH_CAPACITY];
     if (!MakeDevicePath(LIVE_TUNING_PATH, path, sizeof(path))) return;
-    FILE* file = std::fopen(path, "rt");
+    FILE* file = OpenRegularStream(path, REGULAR_FILE_READ);
     if (file == nullptr) return;
     int scanned = std::fscanf(file, "%f %f %f %f %f", &values[0], &values[1], &values[2],
                               &values[3], &values[4]);
