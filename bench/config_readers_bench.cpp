@@ -2,6 +2,7 @@
 // debug configuration is read as the manager reads it while eglGetDisplay builds it, in
 // the shapes that make one element's lists long and in shapes that do not; the
 // complexity fit over sizes from 64 KiB to 4 MiB says how the time grows with the size.
+// The live-tuning file is read as each poll at eglSwapBuffers reads it, up to 100 MiB.
 #include <benchmark/benchmark.h>
 
 #include <cstdint>
@@ -10,6 +11,8 @@
 #include <string>
 
 #include "config/debug_config.h"
+#include "config/stereo_profile.h"
+#include "present/live_tuning.h"
 
 namespace {
 
@@ -21,11 +24,11 @@ void WriteFile(const char* device_path, const std::string& head, const std::stri
                const std::string& tail, size_t size) {
     const std::filesystem::path path = DevicePath(device_path);
     std::filesystem::create_directories(path.parent_path());
-    std::ofstream file(path, std::ios::binary | std::ios::trunc);
-    file << head;
-    size_t written = head.size() + tail.size();
-    for (; written + unit.size() <= size; written += unit.size()) file << unit;
-    file << std::string(size - written, ' ') << tail;
+    std::string text = head;
+    text.reserve(size);
+    while (text.size() + unit.size() + tail.size() <= size) text += unit;
+    text.append(size - text.size() - tail.size(), ' ');
+    std::ofstream(path, std::ios::binary | std::ios::trunc) << text << tail;
 }
 
 // A well-formed configuration whose root element holds one shape, repeated.
@@ -56,6 +59,32 @@ void ReadDebugConfiguration(benchmark::State& state, const ConfigurationShape& s
     std::filesystem::remove(DevicePath(ovo::DEBUG_CONFIG_PATH));
 }
 
+// A live-tuning file of the given size: the five numbers and then anything, white space
+// before the numbers, or one long number.
+struct LiveTuningShape {
+    const char* m_name;
+    const char* m_head;
+    const char* m_unit;
+    const char* m_tail;
+};
+
+const LiveTuningShape LIVE_TUNING_SHAPES[] = {
+    {"numbers_first", "0.02 1.5 0 1 0\n", "#", ""},
+    {"space_first", "", " ", "0.02 1.5 0 1 0\n"},
+    {"long_number", "0.0", "0", "2 1.5 0 1 0\n"},
+};
+
+void PollLiveTuning(benchmark::State& state, const LiveTuningShape& shape) {
+    WriteFile(ovo::LIVE_TUNING_PATH, shape.m_head, shape.m_unit, shape.m_tail, static_cast<size_t>(state.range(0)));
+    ovo::StereoProfile profile;
+    for (auto _ : state) {
+        ovo::ReadLiveTuning(profile);
+        benchmark::DoNotOptimize(profile.m_eye_distance);
+    }
+    state.SetComplexityN(state.range(0));
+    std::filesystem::remove(DevicePath(ovo::LIVE_TUNING_PATH));
+}
+
 }  // namespace
 
 int main(int argc, char** argv) {
@@ -65,6 +94,15 @@ int main(int argc, char** argv) {
             ->RangeMultiplier(4)
             ->Range(64 << 10, 4 << 20)
             ->Unit(benchmark::kMillisecond)
+            ->Complexity();
+    }
+    for (const LiveTuningShape& shape : LIVE_TUNING_SHAPES) {
+        benchmark::RegisterBenchmark((std::string("LiveTuningPoll/") + shape.m_name).c_str(), PollLiveTuning,
+                                     shape)
+            ->Arg(1 << 10)
+            ->Arg(1 << 20)
+            ->Arg(100 << 20)
+            ->Unit(benchmark::kMicrosecond)
             ->Complexity();
     }
     benchmark::Initialize(&argc, argv);
