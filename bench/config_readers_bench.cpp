@@ -18,28 +18,27 @@ namespace {
 
 std::string DevicePath(const char* device_path) { return std::string(OVO_BENCH_CONFIG_ROOT) + device_path; }
 
-// Writes `size` bytes at `device_path`: `head`, then `unit` as often as it fits, then
-// `tail`, padded with spaces.
-void WriteFile(const char* device_path, const std::string& head, const std::string& unit,
-               const std::string& tail, size_t size) {
-    const std::filesystem::path path = DevicePath(device_path);
-    std::filesystem::create_directories(path.parent_path());
-    std::string text = head;
-    text.reserve(size);
-    while (text.size() + unit.size() + tail.size() <= size) text += unit;
-    text.append(size - text.size() - tail.size(), ' ');
-    std::ofstream(path, std::ios::binary | std::ios::trunc) << text << tail;
-}
-
-// A well-formed configuration whose root element holds one shape, repeated.
-struct ConfigurationShape {
+// A file made to a size: `head`, then `unit` as often as it fits, then spaces and `tail`.
+struct FileShape {
     const char* m_name;
     const char* m_head;
     const char* m_unit;
     const char* m_tail;
 };
 
-const ConfigurationShape SHAPES[] = {
+void WriteFile(const char* device_path, const FileShape& shape, size_t size) {
+    const std::filesystem::path path = DevicePath(device_path);
+    std::filesystem::create_directories(path.parent_path());
+    const std::string unit = shape.m_unit, tail = shape.m_tail;
+    std::string text = shape.m_head;
+    text.reserve(size);
+    while (text.size() + unit.size() + tail.size() <= size) text += unit;
+    text.append(size - text.size() - tail.size(), ' ');
+    std::ofstream(path, std::ios::binary | std::ios::trunc) << text << tail;
+}
+
+// Well-formed configurations whose root element holds one shape, repeated.
+const FileShape CONFIGURATION_SHAPES[] = {
     {"children", "<duoscope version=\"1.0\">", "<a/>", "</duoscope>"},
     {"attributes", "<duoscope version=\"1.0\" ", "a=\"\" ", "/>"},
     {"top_level", "<duoscope version=\"1.0\"/>", "<a/>", ""},
@@ -47,9 +46,8 @@ const ConfigurationShape SHAPES[] = {
     {"comments", "<duoscope version=\"1.0\">", "<!-- a comment --> some text ", "</duoscope>"},
 };
 
-void ReadDebugConfiguration(benchmark::State& state, const ConfigurationShape& shape) {
-    const size_t size = static_cast<size_t>(state.range(0));
-    WriteFile(ovo::DEBUG_CONFIG_PATH, shape.m_head, shape.m_unit, shape.m_tail, size);
+void ReadDebugConfiguration(benchmark::State& state, const FileShape& shape) {
+    WriteFile(ovo::DEBUG_CONFIG_PATH, shape, static_cast<size_t>(state.range(0)));
     for (auto _ : state) {
         ovo::DebugConfig config;
         benchmark::DoNotOptimize(config.m_log);
@@ -59,23 +57,16 @@ void ReadDebugConfiguration(benchmark::State& state, const ConfigurationShape& s
     std::filesystem::remove(DevicePath(ovo::DEBUG_CONFIG_PATH));
 }
 
-// A live-tuning file of the given size: the five numbers and then anything, white space
-// before the numbers, or one long number.
-struct LiveTuningShape {
-    const char* m_name;
-    const char* m_head;
-    const char* m_unit;
-    const char* m_tail;
-};
-
-const LiveTuningShape LIVE_TUNING_SHAPES[] = {
+// Live-tuning files: the five numbers and then anything, white space before the numbers,
+// or one long number before the other four.
+const FileShape LIVE_TUNING_SHAPES[] = {
     {"numbers_first", "0.02 1.5 0 1 0\n", "#", ""},
     {"space_first", "", " ", "0.02 1.5 0 1 0\n"},
     {"long_number", "0.0", "0", "2 1.5 0 1 0\n"},
 };
 
-void PollLiveTuning(benchmark::State& state, const LiveTuningShape& shape) {
-    WriteFile(ovo::LIVE_TUNING_PATH, shape.m_head, shape.m_unit, shape.m_tail, static_cast<size_t>(state.range(0)));
+void PollLiveTuning(benchmark::State& state, const FileShape& shape) {
+    WriteFile(ovo::LIVE_TUNING_PATH, shape, static_cast<size_t>(state.range(0)));
     ovo::StereoProfile profile;
     for (auto _ : state) {
         ovo::ReadLiveTuning(profile);
@@ -88,7 +79,7 @@ void PollLiveTuning(benchmark::State& state, const LiveTuningShape& shape) {
 }  // namespace
 
 int main(int argc, char** argv) {
-    for (const ConfigurationShape& shape : SHAPES) {
+    for (const FileShape& shape : CONFIGURATION_SHAPES) {
         benchmark::RegisterBenchmark((std::string("DebugConfiguration/") + shape.m_name).c_str(),
                                      ReadDebugConfiguration, shape)
             ->RangeMultiplier(4)
@@ -96,7 +87,7 @@ int main(int argc, char** argv) {
             ->Unit(benchmark::kMillisecond)
             ->Complexity();
     }
-    for (const LiveTuningShape& shape : LIVE_TUNING_SHAPES) {
+    for (const FileShape& shape : LIVE_TUNING_SHAPES) {
         benchmark::RegisterBenchmark((std::string("LiveTuningPoll/") + shape.m_name).c_str(), PollLiveTuning,
                                      shape)
             ->Arg(1 << 10)
