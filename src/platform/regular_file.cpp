@@ -11,8 +11,8 @@ int OpenRegularFile(const char* path, RegularFileUse use) {
     const int file = open(path, access | O_NONBLOCK | O_NOCTTY | O_CLOEXEC, 0666);
     if (file < 0) return -1;
     struct stat status;
-    // Emptied only once it is known to be a regular file; the blocking mode comes back
-    // for the reads and writes, which a regular file never holds up anyway.
+    // Emptied only once it is known to be a regular file, and then put back into blocking
+    // mode, so that its reads and writes behave as after fopen.
     const bool regular = fstat(file, &status) == 0 && S_ISREG(status.st_mode);
     if (!regular || (use == REGULAR_FILE_REPLACE && ftruncate(file, 0) != 0) ||
         fcntl(file, F_SETFL, fcntl(file, F_GETFL) & ~O_NONBLOCK) != 0) {
