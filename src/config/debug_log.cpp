@@ -4,21 +4,22 @@
 
 #include "platform/device_path.h"
 #include "platform/log.h"
+#include "platform/regular_file.h"
 
 namespace ovo {
 
 namespace {
 
 FILE* OpenLogFile(const char* device_path) {
-    constexpr const char* mode = "wt";
     char path[DEVICE_PATH_CAPACITY];
     path[0] = '\0';
     bool mapped = device_path != nullptr && MakeDevicePath(device_path, path, sizeof(path));
-    FILE* file = mapped ? std::fopen(path, mode) : nullptr;
+    FILE* file = mapped ? OpenRegularStream(path, REGULAR_FILE_REPLACE) : nullptr;
     // Only the low 32 bits of the stream pointer on 64-bit builds: it merely tells
-    // success from failure in the log.
+    // success from failure in the log. The line names the mode that a text log is
+    // written with, whichever call opened it.
     LogPrint(LOG_PRIORITY_INFO, "stream(0x%08x) = fopen(path=%s, attrib=%s)\n",
-             static_cast<unsigned>(reinterpret_cast<uintptr_t>(file)), path, mode);
+             static_cast<unsigned>(reinterpret_cast<uintptr_t>(file)), path, "wt");
     return file;
 }
 

@@ -31,8 +31,8 @@ public:
 // Writes into a file, opened (and truncated) when the writer is built.
 class FileDebugLog : public DebugLog {
 public:
-    // `path` is a device path; when it cannot be opened the fallback is tried, and when
-    // that fails too the writer stays silent.
+    // `path` is a device path; when it cannot be opened (or is not a regular file) the
+    // fallback is tried, and when that fails too the writer stays silent.
     explicit FileDebugLog(const char* path);
     ~FileDebugLog() override;
 

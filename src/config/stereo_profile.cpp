@@ -8,6 +8,7 @@
 
 #include "platform/device_path.h"
 #include "platform/log.h"
+#include "platform/regular_file.h"
 
 namespace ovo {
 
@@ -33,7 +34,7 @@ bool StereoProfile::LoadProfile() {
 
     char path[DEVICE_PATH_CAPACITY];
     if (!MakeDevicePath(PROFILE_PATH, path, sizeof(path))) return false;
-    FILE* file = std::fopen(path, "rb");
+    FILE* file = OpenRegularStream(path, REGULAR_FILE_READ);
     if (file == nullptr) return false;
     ReadProfileTable(file, m_item_table);
     std::fclose(file);

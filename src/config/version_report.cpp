@@ -3,6 +3,7 @@
 #include <cstdio>
 
 #include "platform/device_path.h"
+#include "platform/regular_file.h"
 
 #ifndef OVO_BUILD_REVISION
 #define OVO_BUILD_REVISION "unknown"
@@ -27,7 +28,7 @@ const char* VersionReport::BuildTag() {
 
 void VersionReport::Write() {
     if (path == nullptr) return;
-    FILE* file = std::fopen(path, "wt");
+    FILE* file = OpenRegularStream(path, REGULAR_FILE_REPLACE);
     if (file == nullptr) return;
     std::fprintf(file, "%s\n", BuildTag());
     std::fputs("[package name]\n\t", file);

@@ -16,7 +16,8 @@ public:
 
     void SetPackageName(const char* name) { package_name = name; }
     void SetGlVersion(int32_t es2) { is_es2 = es2; }
-    // Replaces the file; silently does nothing when it cannot be opened.
+    // Replaces the file; silently does nothing when it cannot be opened or something
+    // other than a regular file is at the path.
     void Write();
 
     // Identifies this build: "(r <revision>)(<date>,<time>)".

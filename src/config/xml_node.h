@@ -8,8 +8,8 @@
 
 namespace ovo {
 
-// Lists grow by this many entries at a time.
-constexpr int32_t XML_LIST_GROWTH = 16;
+// Room that a list makes at its first append; it doubles whenever it is full.
+constexpr int32_t XML_LIST_FIRST_CAPACITY = 16;
 // Room for a query result: 255 characters and the terminator.
 constexpr size_t XML_QUERY_RESULT_CAPACITY = 256;
 // Room for one segment of a query path: 63 characters and the terminator.
@@ -52,16 +52,7 @@ public:
 
     // Takes ownership of `node` on success; false only when no memory is left.
     bool Append(Node* node) {
-        if (m_count >= m_capacity) {
-            if (m_capacity > INT32_MAX - XML_LIST_GROWTH) return false;
-            int32_t capacity = m_capacity + XML_LIST_GROWTH;
-            Node** items = static_cast<Node**>(std::malloc(sizeof(Node*) * capacity));
-            if (items == nullptr) return false;
-            if (m_count > 0) std::memcpy(items, m_items, sizeof(Node*) * m_count);
-            std::free(m_items);
-            m_items = items;
-            m_capacity = capacity;
-        }
+        if (m_count >= m_capacity && !Grow()) return false;
         m_items[m_count++] = node;
         return true;
     }
@@ -71,6 +62,19 @@ public:
     int32_t Count() const { return m_count; }
 
 private:
+    // Doubling rather than a fixed step: n appends then copy fewer than n entries in all,
+    // where a fixed step copied about n * n / (2 * step) of them.
+    bool Grow() {
+        if (m_capacity > INT32_MAX / 2) return false;
+        const int32_t capacity = m_capacity == 0 ? XML_LIST_FIRST_CAPACITY : 2 * m_capacity;
+        if (static_cast<size_t>(capacity) > SIZE_MAX / sizeof(Node*)) return false;
+        Node** items = static_cast<Node**>(std::realloc(m_items, sizeof(Node*) * capacity));
+        if (items == nullptr) return false;
+        m_items = items;
+        m_capacity = capacity;
+        return true;
+    }
+
     Node** m_items;
     int32_t m_capacity;
     int32_t m_count;

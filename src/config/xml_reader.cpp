@@ -3,6 +3,7 @@
 #include <cstring>
 
 #include "config/xml_tokenizer.h"
+#include "platform/regular_file.h"
 
 namespace ovo {
 
@@ -76,7 +77,7 @@ XmlElement* ReadElement(XmlTokenizer& tokenizer, int depth) {
 }  // namespace
 
 XmlElement* ParseXmlFile(const char* path) {
-    FILE* stream = std::fopen(path, "rt");
+    FILE* stream = OpenRegularStream(path, REGULAR_FILE_READ);
     if (stream == nullptr) return nullptr;
     XmlElement* document = ParseXmlStream(stream);
     std::fclose(stream);

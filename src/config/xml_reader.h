@@ -11,8 +11,8 @@ namespace ovo {
 constexpr int XML_DEPTH_LIMIT = 256;
 
 // The document read from the file at `path` (a path of the running system, not a device
-// path), owned by the caller; null when the file cannot be opened or a token error
-// occurs between top-level elements.
+// path), owned by the caller; null when there is no regular file to open or a token
+// error occurs between top-level elements.
 XmlElement* ParseXmlFile(const char* path);
 
 // The same for an open stream, which is left open.

@@ -10,7 +10,8 @@ class StereoProfile;
 constexpr const char LIVE_TUNING_PATH[] = "/sdcard/game_profile.txt";
 
 // Reads the file into the profile's live parameters. A missing file changes nothing; a
-// position that holds no number sets its parameter to 0.
+// position that holds no number sets its parameter to 0. Only the file's first
+// LIVE_TUNING_READ_LIMIT bytes are read (live_tuning_text.h).
 void ReadLiveTuning(StereoProfile& profile);
 
 }  // namespace ovo

@@ -81,6 +81,23 @@ TEST(XmlReader, SurvivesDeepNesting) {
     EXPECT_LE(Depth(*document->GetChild(0)), ovo::XML_DEPTH_LIMIT);
 }
 
+// The lists grow in steps; every entry must survive them, in file order.
+TEST(XmlReader, KeepsEveryEntryOfLongLists) {
+    std::string text = "<r";
+    for (int i = 0; i < 1000; ++i) text += " a" + std::to_string(i) + "=\"" + std::to_string(i) + "\"";
+    text += ">";
+    for (int i = 0; i < 1000; ++i) text += "<c" + std::to_string(i) + "/>";
+    std::unique_ptr<XmlElement> document = Parse(text + "</r>");
+    ASSERT_NE(document, nullptr);
+    const XmlElement* root = document->GetChild(0);
+    ASSERT_EQ(root->AttributeCount(), 1000);
+    ASSERT_EQ(root->ChildCount(), 1000);
+    for (int i = 0; i < 1000; ++i) {
+        EXPECT_STREQ(root->GetAttribute(i)->GetValue(), std::to_string(i).c_str());
+        EXPECT_STREQ(root->GetChild(i)->GetName(), ("c" + std::to_string(i)).c_str());
+    }
+}
+
 TEST(XmlQuery, ResolvesPaths) {
     const std::string segment63(63, 's'), long_value(300, 'v');
     std::unique_ptr<XmlElement> document = Parse(
