@@ -10,8 +10,8 @@
 
 int main(int argc, char** argv) {
     using namespace ovo_sample;
-    const SampleInfo info = {"lifecycle_es1", 1,
-                             REFERENCE_OPTION_EYE | REFERENCE_OPTION_OVERLAY | REFERENCE_OPTION_HUD};
+    const SampleInfo info = {
+        "lifecycle_es1", 1, REFERENCE_OPTION_EYE | REFERENCE_OPTION_OVERLAY | REFERENCE_OPTION_HUD};
     return RunLifecycleSample<Es1Scene, &Es1Scene::UseCrateTexture>(
         info, argc, argv,
         [](const SampleArgs& args) { return Es1Scene(args.m_reference, args.m_size); });
