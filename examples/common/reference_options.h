@@ -10,6 +10,7 @@ constexpr uint32_t REFERENCE_OPTION_EYE = 1;             // --eye, --eye-distanc
 constexpr uint32_t REFERENCE_OPTION_OVERLAY = 2;         // --overlay-reference
 constexpr uint32_t REFERENCE_OPTION_VIEWPORT_SCALE = 4;  // --viewport-scale
 constexpr uint32_t REFERENCE_OPTION_TEXTURE_PASS = 8;    // --texture-pass
+constexpr uint32_t REFERENCE_OPTION_HUD = 16;            // --hud
 
 constexpr int32_t REFERENCE_NO_EYE = -1;
 
@@ -31,6 +32,9 @@ struct ReferenceOptions {
     bool m_overlay = false;
     float m_overlay_width = 0.0f;
     float m_overlay_height = 0.0f;
+
+    // The HUD's draws are left out, as a converter shows the frame when it drops them.
+    bool m_hud_left_out = false;
 
     // Every viewport the game sets is scaled by these factors.
     bool m_viewport_scaled = false;

@@ -120,6 +120,13 @@ bool ParseTexturePass(const char* text, SampleArgs* args) {
     return true;
 }
 
+bool ParseHud(const char* text, SampleArgs* args) {
+    const bool left_out = std::strcmp(text, "left-out") == 0;
+    if (!left_out && std::strcmp(text, "drawn") != 0) return false;
+    args->m_reference.m_hud_left_out = left_out;
+    return true;
+}
+
 bool ParseOverlay(const char* text, SampleArgs* args) {
     ReferenceOptions& reference = args->m_reference;
     reference.m_overlay =
@@ -166,6 +173,8 @@ const SampleOption SAMPLE_OPTIONS[] = {
      "or per eye", ParseTexturePass, REFERENCE_OPTION_TEXTURE_PASS, EyeRule::NEEDS_EYE},
     {"--overlay-reference", "W,H", "HUD through a texture, composed into two W x H halves",
      ParseOverlay, REFERENCE_OPTION_OVERLAY, EyeRule::NEEDS_EYE},
+    {"--hud", "drawn|left-out", "the HUD's draws: drawn (default) or left out", ParseHud,
+     REFERENCE_OPTION_HUD, EyeRule::ANY},
     {"--viewport-scale", "SX,SY", "scale the viewports the game sets for its window",
      ParseViewportScale, REFERENCE_OPTION_VIEWPORT_SCALE, EyeRule::WITHOUT_EYE},
 };

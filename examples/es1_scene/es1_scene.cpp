@@ -117,6 +117,7 @@ void Es1Scene::DrawFrame(int32_t frame) {
 }
 
 void Es1Scene::DrawHud(int32_t frame) const {
+    if (m_reference.m_hud_left_out) return;
     if (!m_reference.m_overlay) {
         m_hud.Draw(frame);
         return;

@@ -4,13 +4,15 @@
 // textures go on the textured crate.
 //   lifecycle_es1 OUTPUT.png --scenario NAME [--frames N] [--size WxH] [--game-size WxH]
 //       [--eye 0|1 [--eye-distance D] [--eye-angle A] [--eye-shift S]
-//        [--overlay-reference W,H]]
+//        [--overlay-reference W,H]] [--hud drawn|left-out]
 #include "es1_scene/es1_scene.h"
 #include "lifecycle/lifecycle_main.h"
 
 int main(int argc, char** argv) {
     using namespace ovo_sample;
+    const SampleInfo info = {
+        "lifecycle_es1", 1, REFERENCE_OPTION_EYE | REFERENCE_OPTION_OVERLAY | REFERENCE_OPTION_HUD};
     return RunLifecycleSample<Es1Scene, &Es1Scene::UseCrateTexture>(
-        {"lifecycle_es1", 1, REFERENCE_OPTION_EYE | REFERENCE_OPTION_OVERLAY}, argc, argv,
+        info, argc, argv,
         [](const SampleArgs& args) { return Es1Scene(args.m_reference, args.m_size); });
 }

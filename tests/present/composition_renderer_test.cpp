@@ -1,5 +1,6 @@
 // The column mask on the recording vendor: the lines, the stencil references, the panel's
-// composition start, and the exact calls of one frame in each drawing path.
+// composition start, the exact calls of one frame in each drawing path, and the mask a
+// window surface gets at its first stereo draw after it was made current.
 #include "present/composition_renderer.h"
 
 #include <gtest/gtest.h>
@@ -11,6 +12,8 @@
 #include <vector>
 
 #include "core/stereo_manager.h"
+#include "stereo/es1_stereo_layer.h"
+#include "stereo/es2_stereo_layer.h"
 #include "support/device_files.h"
 #include "support/egl_session.h"
 #include "support/forwarding_check.h"
@@ -29,7 +32,8 @@ protected:
         vendor_root::InstallRecorder();
         m_egl.Open();
         ASSERT_NE(m_egl.m_display, EGL_NO_DISPLAY);
-        ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(path == PATH_GL2 ? 2 : 1)), EGL_TRUE);
+        m_context = m_egl.CreateContext(path == PATH_GL2 ? 2 : 1);
+        ASSERT_EQ(m_egl.MakeCurrent(m_context), EGL_TRUE);
         device_files::Write("/dev/zdriver", "");
         Manager().m_es2_layer_installed = path == PATH_GL2;
         SetTargetSize(width, height);
@@ -44,12 +48,14 @@ protected:
     }
 
     EglSession m_egl;
+    EGLContext m_context = EGL_NO_CONTEXT;
     ovo::CompositionRenderer m_renderer{1};
 };
 
-// The recorded GL calls, naming the first one that differs.
-void ExpectCalls(const std::vector<std::string>& expected) {
-    const std::vector<std::string> calls = RecordedGlCalls();
+using Calls = std::vector<std::string>;
+
+// The recorded GL calls (or `calls`), naming the first one that differs.
+void ExpectCalls(const Calls& expected, const Calls& calls = RecordedGlCalls()) {
     for (size_t i = 0; i < std::max(calls.size(), expected.size()); ++i) {
         ASSERT_EQ(i < calls.size() ? calls[i] : "(none)",
                   i < expected.size() ? expected[i] : "(none)")
@@ -200,9 +206,11 @@ TEST_F(CompositionRendererTest,
     EXPECT_EQ(line_pointers, 2);
 }
 
-TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
-    Start(PATH_GL1, 1280, 720);
-    m_renderer.Present(Manager());  // builds the lines
+// The application's vertex pointer, as the OpenGL ES 1.x path saves it.
+const void* const APPLICATION_VERTICES = &APPLICATION_VERTICES;
+
+// Saved values of the OpenGL ES 1.x path, unlike everything a frame sets.
+void AnswerGl1State() {
     AnswerSharedState();
     AnswerEachInteger({{GL_MATRIX_MODE, GL_TEXTURE}, {GL_BLEND_SRC, GL_SRC_ALPHA},
                        {GL_BLEND_DST, GL_ONE_MINUS_SRC_ALPHA}, {GL_ALPHA_TEST_FUNC, GL_GREATER},
@@ -217,14 +225,16 @@ TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
     AnswerFloats(ovo::GL_ENTRY_glGetFloatv, GL_ALPHA_TEST_REF, {0.5f});
     AnswerFloats(ovo::GL_ENTRY_glGetFloatv, GL_CURRENT_COLOR, {0.25f, 0.5f, 0.75f, 0.125f});
     AnswerIntegers(ovo::GL_ENTRY_glGetTexEnviv, GL_TEXTURE_ENV_MODE, {GL_MODULATE});
-    const void* application_vertices = &application_vertices;
-    AnswerBytes(ovo::GL_ENTRY_glGetPointerv, GL_VERTEX_ARRAY_POINTER, &application_vertices, sizeof(void*));
-    SetTargetSize(960, 540);  // the lines stay; viewport and projection follow
-    ResetRecorder();
-    m_renderer.Present(Manager());
-    const std::vector<std::string> expected = {
-        "glEnable(0x0B90)", "glClearStencil(1)", "glClear(0x4500)", "glStencilFunc(0x0200, 0, 1)",
-        "glStencilOp(0x1E01, 0x1E00, 0x1E00)",
+    AnswerBytes(ovo::GL_ENTRY_glGetPointerv, GL_VERTEX_ARRAY_POINTER, &APPLICATION_VERTICES,
+                sizeof(void*));
+}
+
+// One OpenGL ES 1.x mask over the state of AnswerGl1State, clearing `clear` (as recorded):
+// its lines built for 1280 x 720, drawn at 960 x 540.
+Calls Gl1MaskCalls(const std::string& clear) {
+    return {
+        "glEnable(0x0B90)", "glClearStencil(1)", "glClear(" + clear + ")",
+        "glStencilFunc(0x0200, 0, 1)", "glStencilOp(0x1E01, 0x1E00, 0x1E00)",
         // saved, the write masks switched off right away
         "glGetBooleanv(0x0C23, ptr)", "glColorMask(0, 0, 0, 0)", "glGetBooleanv(0x0B72, ptr)",
         "glDepthMask(0)", "glGetIntegerv(0x0BA0, ptr)", "glGetIntegerv(0x0BE1, ptr)",
@@ -265,34 +275,36 @@ TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
         "glTexCoordPointer(2, 0x1406, 8, null)", "glDepthMask(1)", "glColorMask(0, 1, 0, 1)",
         // the stencil stage back to keeping
         "glStencilOp(0x1E00, 0x1E00, 0x1E00)", "glDisable(0x0B90)"};
-    ExpectCalls(expected);
-    const RecordedCall* pointer =
-        FindRecordedCall(RECORDER_API_GLES1, ovo::GL_ENTRY_glVertexPointer);
-    ASSERT_NE(pointer, nullptr);
-    EXPECT_EQ(pointer->m_arguments[3], ArgumentBits(application_vertices))
-        << "the saved pointer is put back";
 }
 
-TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
-    Start(PATH_GL2, 1024, 600);  // unknown: drawn as 800 x 480
+// The application's attribute 0 as the OpenGL ES 2.0 path saves it: at offset 8 of its buffer.
+const void* const ATTRIBUTE_OFFSET = reinterpret_cast<const void*>(8);
+
+// Saved values of the OpenGL ES 2.0 path, and the names of the mask's program (7, its
+// uniforms at 3) when it is built.
+void AnswerGl2State() {
     AnswerSharedState();
     AnswerEachInteger({{GL_CURRENT_PROGRAM, 9}});
-    // The application's attribute 0: off, at offset 8 of buffer 14 (not the array buffer 10).
+    // The application's attribute 0: off, in buffer 14 (not the array buffer 10).
     AnswerEachInteger({{GL_VERTEX_ATTRIB_ARRAY_ENABLED, 0}, {GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, 14},
                        {GL_VERTEX_ATTRIB_ARRAY_SIZE, 3}, {GL_VERTEX_ATTRIB_ARRAY_TYPE, GL_SHORT},
                        {GL_VERTEX_ATTRIB_ARRAY_NORMALIZED, 1}, {GL_VERTEX_ATTRIB_ARRAY_STRIDE, 12}},
                       ovo::GL_ENTRY_glGetVertexAttribiv);
-    const void* attribute_offset = reinterpret_cast<const void*>(8);
     AnswerBytes(ovo::GL_ENTRY_glGetVertexAttribPointerv, GL_VERTEX_ATTRIB_ARRAY_POINTER,
-                &attribute_offset, sizeof(void*));
+                &ATTRIBUTE_OFFSET, sizeof(void*));
     AnswerResult(ovo::GL_ENTRY_glCreateProgram, 0, 7);
     AnswerResult(ovo::GL_ENTRY_glCreateShader, GL_VERTEX_SHADER, 11);
     AnswerResult(ovo::GL_ENTRY_glCreateShader, GL_FRAGMENT_SHADER, 12);
     AnswerResult(ovo::GL_ENTRY_glGetUniformLocation, 7, 3);
-    m_renderer.Present(Manager());
-    const std::vector<std::string> expected = {
-        "glEnable(0x0B90)", "glClearStencil(1)", "glClear(0x4500)", "glStencilFunc(0x0200, 0, 1)",
-        "glStencilOp(0x1E01, 0x1E00, 0x1E00)",
+}
+
+// One OpenGL ES 2.0 mask over the state of AnswerGl2State at an unknown target size (drawn
+// as 800 x 480), clearing `clear`; the share group's program is built first when
+// `builds_program`.
+Calls Gl2MaskCalls(const std::string& clear, bool builds_program) {
+    Calls calls = {
+        "glEnable(0x0B90)", "glClearStencil(1)", "glClear(" + clear + ")",
+        "glStencilFunc(0x0200, 0, 1)", "glStencilOp(0x1E01, 0x1E00, 0x1E00)",
         // saved
         "glGetIntegerv(0x8B8D, ptr)", "glGetBooleanv(0x0C23, ptr)", "glGetBooleanv(0x0B72, ptr)",
         "glGetIntegerv(0x0BA2, ptr)", "glGetIntegerv(0x0C10, ptr)", "glIsEnabled(0x0BE2)",
@@ -305,14 +317,17 @@ TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
         // set
         "glColorMask(0, 0, 0, 0)", "glDepthMask(0)", "glCullFace(0x0405)", "glFrontFace(0x0901)",
         "glBindBuffer(0x8892, 0)", "glViewport(0, 0, 800, 480)", "glScissor(0, 0, 800, 480)",
-        "glDisable(0x0B44)", "glDisable(0x0B71)",
-        // the share group's program, built at its first frame and kept
+        "glDisable(0x0B44)", "glDisable(0x0B71)"};
+    // the share group's program, built at its first mask and kept
+    const Calls build = {
         "glCreateProgram()", "glCreateShader(0x8B31)", "glShaderSource(11, 1, ptr, null)",
         "glCompileShader(11)", "glCreateShader(0x8B30)", "glShaderSource(12, 1, ptr, null)",
         "glCompileShader(12)", "glAttachShader(7, 11)", "glAttachShader(7, 12)",
         "glBindAttribLocation(7, 0, ptr)", "glLinkProgram(7)", "glDeleteShader(11)",
         "glDeleteShader(12)", "glGetProgramiv(7, 0x8B82, ptr)", "glGetUniformLocation(7, ptr)",
-        "glGetUniformLocation(7, ptr)",
+        "glGetUniformLocation(7, ptr)"};
+    if (builds_program) calls.insert(calls.end(), build.begin(), build.end());
+    const Calls drawn_and_restored = {
         // drawn
         "glUseProgram(7)", "glUniformMatrix4fv(3, 1, 0, ptr)", "glUniform4f(3, 1, 1, 1, 1)",
         "glEnableVertexAttribArray(0)", "glVertexAttribPointer(0, 2, 0x1406, 0, 0, ptr)",
@@ -324,11 +339,34 @@ TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
         "glEnable(0x0B44)", "glCullFace(0x0404)", "glFrontFace(0x0900)",
         "glDepthMask(1)", "glColorMask(0, 1, 0, 1)", "glUseProgram(9)",
         "glStencilOp(0x1E00, 0x1E00, 0x1E00)", "glDisable(0x0B90)"};
-    ExpectCalls(expected);
+    calls.insert(calls.end(), drawn_and_restored.begin(), drawn_and_restored.end());
+    return calls;
+}
+
+TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {
+    Start(PATH_GL1, 1280, 720);
+    m_renderer.Present(Manager());  // builds the lines
+    AnswerGl1State();
+    SetTargetSize(960, 540);  // the lines stay; viewport and projection follow
+    ResetRecorder();
+    m_renderer.Present(Manager());
+    ExpectCalls(Gl1MaskCalls("0x4500"));
+    const RecordedCall* pointer =
+        FindRecordedCall(RECORDER_API_GLES1, ovo::GL_ENTRY_glVertexPointer);
+    ASSERT_NE(pointer, nullptr);
+    EXPECT_EQ(pointer->m_arguments[3], ArgumentBits(APPLICATION_VERTICES))
+        << "the saved pointer is put back";
+}
+
+TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
+    Start(PATH_GL2, 1024, 600);
+    AnswerGl2State();
+    m_renderer.Present(Manager());
+    ExpectCalls(Gl2MaskCalls("0x4500", true));
     const RecordedCall* pointer =
         FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glVertexAttribPointer);
     ASSERT_NE(pointer, nullptr);
-    EXPECT_EQ(pointer->m_arguments[5], ArgumentBits(attribute_offset))
+    EXPECT_EQ(pointer->m_arguments[5], ArgumentBits(ATTRIBUTE_OFFSET))
         << "the saved offset is put back";
     // The sources, byte for byte, as the vendor received them.
     const char* const sources[] = {
@@ -344,6 +382,159 @@ TEST_F(CompositionRendererTest, OneGl2FrameBuildsItsProgramAndRestoresInOrder) {
         EXPECT_STREQ(*reinterpret_cast<const char* const*>(call.m_arguments[2]), sources[source++]);
     }
     EXPECT_EQ(source, 2);
+}
+
+// A second window surface for the context of Start.
+const EGLSurface OTHER_SURFACE = reinterpret_cast<EGLSurface>(0x6000);
+
+// The mask a window surface gets at its first stereo draw after it was made current, as
+// the layers' eye bracket reaches it through the manager's renderer.
+class NewSurfaceMaskTest : public CompositionRendererTest {
+protected:
+    // Interleaving through the manager's renderer; the OpenGL ES 1.x draws are flat.
+    void StartInterleaved(DrawingPath path, int32_t width, int32_t height) {
+        m_path = path;
+        Start(path, width, height);
+        if (Manager().m_composer == nullptr) Manager().m_composer = new ovo::CompositionRenderer(1);
+        Manager().m_interleave = true;
+        const std::vector<GLfloat> identity = {1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1};
+        for (GLenum matrix : {GL_PROJECTION_MATRIX, GL_MODELVIEW_MATRIX}) {
+            AnswerBytes(ovo::GL_ENTRY_glGetFloatv, matrix, identity.data(),
+                        identity.size() * sizeof(GLfloat));
+        }
+    }
+
+    // The process's first Present is over, with the path's state answered.
+    void StartPresented(DrawingPath path) {
+        if (path == PATH_GL1) {
+            StartInterleaved(PATH_GL1, 1280, 720);
+            Composer().Present(Manager());
+            AnswerGl1State();
+            SetTargetSize(960, 540);
+        } else {
+            StartInterleaved(PATH_GL2, 1024, 600);
+            AnswerGl2State();
+            Composer().Present(Manager());
+        }
+    }
+
+    static ovo::CompositionRenderer& Composer() { return *Manager().m_composer; }
+
+    void MakeCurrent(EGLSurface surface) {
+        ASSERT_EQ(eglMakeCurrent(m_egl.m_display, surface, surface, m_context), EGL_TRUE);
+    }
+
+    // One draw through the path's stereo layer; its GL calls.
+    Calls Draw() {
+        ResetRecorder();
+        if (m_path == PATH_GL1) {
+            m_es1.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        } else {
+            m_es2.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        }
+        return RecordedGlCalls();
+    }
+
+    // The framebuffer query and the stencil-only mask of a new window surface.
+    Calls NewSurfaceMask() const {
+        Calls calls = {"glGetIntegerv(0x8CA6, ptr)"};
+        const Calls mask =
+            m_path == PATH_GL1 ? Gl1MaskCalls("0x0400") : Gl2MaskCalls("0x0400", false);
+        calls.insert(calls.end(), mask.begin(), mask.end());
+        return calls;
+    }
+
+    // `draw` with `calls` just before its mask test goes on.
+    static Calls BeforeMaskTest(Calls draw, const Calls& calls) {
+        const auto mask_test = std::find(draw.begin(), draw.end(), "glEnable(0x0B90)");
+        EXPECT_NE(mask_test, draw.end()) << "the draw never switched the mask test on";
+        draw.insert(mask_test, calls.begin(), calls.end());
+        return draw;
+    }
+
+    DrawingPath m_path = PATH_GL1;
+    ovo::Es1StereoLayer m_es1;
+    ovo::Es2StereoLayer m_es2{ovo::LAYER_SUBMODE_DIRECT};
+};
+
+class NewSurfaceMaskPathTest : public NewSurfaceMaskTest,
+                               public ::testing::WithParamInterface<DrawingPath> {};
+
+// The second draw is the baseline: the first is the same with the mask before its mask test.
+TEST_P(NewSurfaceMaskPathTest, AnotherSurfaceGetsTheStencilOnlyMaskOnceBeforeItsMaskTest) {
+    StartPresented(GetParam());
+    MakeCurrent(OTHER_SURFACE);
+    const Calls first = Draw();
+    const Calls second = Draw();
+    ExpectCalls(BeforeMaskTest(second, NewSurfaceMask()), first);
+}
+
+INSTANTIATE_TEST_SUITE_P(Paths, NewSurfaceMaskPathTest, ::testing::Values(PATH_GL1, PATH_GL2),
+                         [](const ::testing::TestParamInfo<DrawingPath>& test) {
+                             return test.param == PATH_GL2 ? "Gl2" : "Gl1";
+                         });
+
+enum Release { RELEASE_NONE, RELEASE_MAKE_CURRENT, RELEASE_THREAD };
+
+// Each case follows the one before it, on a surface that a Present has just masked.
+TEST_F(NewSurfaceMaskTest, ASurfaceIsMaskedAgainOnlyAfterAReleaseOrAnotherSurface) {
+    StartPresented(PATH_GL1);
+    const Calls plain = Draw();
+    struct Case {
+        const char* m_label;
+        Release m_release;
+        EGLSurface m_surface;
+        bool m_masked;
+    } cases[] = {
+        {"the same surface again", RELEASE_NONE, EglSession::Surface(), false},
+        {"the same surface after a make-current without a context", RELEASE_MAKE_CURRENT,
+         EglSession::Surface(), true},
+        {"the same surface after eglReleaseThread", RELEASE_THREAD, EglSession::Surface(), true},
+        {"another surface", RELEASE_NONE, OTHER_SURFACE, true},
+        {"the other surface again", RELEASE_NONE, OTHER_SURFACE, false},
+        {"the first surface back", RELEASE_NONE, EglSession::Surface(), true},
+    };
+    for (const Case& each : cases) {
+        SCOPED_TRACE(each.m_label);
+        Composer().Present(Manager());
+        if (each.m_release == RELEASE_MAKE_CURRENT) {
+            ASSERT_EQ(m_egl.MakeCurrent(EGL_NO_CONTEXT), EGL_TRUE);
+        }
+        // The recording vendor answers eglReleaseThread with a value of its own, not EGL_TRUE.
+        if (each.m_release == RELEASE_THREAD) {
+            ASSERT_NE(eglReleaseThread(), EGL_FALSE);
+        }
+        MakeCurrent(each.m_surface);
+        ExpectCalls(each.m_masked ? BeforeMaskTest(plain, NewSurfaceMask()) : plain, Draw());
+        ExpectCalls(plain, Draw());
+    }
+}
+
+TEST_F(NewSurfaceMaskTest, NothingIsMaskedBeforeTheProcesssFirstPresent) {
+    StartInterleaved(PATH_GL1, 1280, 720);
+    AnswerGl1State();
+    MakeCurrent(OTHER_SURFACE);
+    const Calls before = Draw();
+    Composer().Present(Manager());  // builds the lines and masks the surface
+    SetTargetSize(960, 540);
+    const Calls plain = Draw();
+    ExpectCalls(plain, before);
+    MakeCurrent(EglSession::Surface());
+    ExpectCalls(BeforeMaskTest(plain, NewSurfaceMask()), Draw());
+}
+
+// The framebuffer binding is asked at every draw until the window's is bound.
+TEST_F(NewSurfaceMaskTest, NothingIsMaskedWhileTheApplicationsFramebufferIsBound) {
+    StartPresented(PATH_GL1);
+    const Calls plain = Draw();
+    MakeCurrent(OTHER_SURFACE);
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING, {5});
+    for (int draw = 0; draw < 2; ++draw) {
+        ExpectCalls(BeforeMaskTest(plain, {"glGetIntegerv(0x8CA6, ptr)"}), Draw());
+    }
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING, {0});
+    ExpectCalls(BeforeMaskTest(plain, NewSurfaceMask()), Draw());
+    ExpectCalls(plain, Draw());
 }
 
 }  // namespace
