@@ -13,6 +13,7 @@
 #include "stereo/es2_stereo_layer.h"
 #include "stereo/overlay_target.h"
 #include "support/mesa_context.h"
+#include "support/render_texture_draw.h"
 
 namespace {
 
@@ -87,36 +88,11 @@ protected:
         manager.UpdateScale();
         // Red where eye 0 draws, green where eye 1 does: the injected uniform's gain has
         // each eye's sign.
-        m_eye_colours = Program("attribute vec2 position; varying float eye; void main() {"
-                                " eye = uZpDepthShift.y; gl_Position = vec4(position, 0.0, 1.0); }",
-                                "precision mediump float; varying float eye; void main() {"
-                                " gl_FragColor = eye > 0.0 ? vec4(1, 0, 0, 1) : vec4(0, 1, 0, 1); }");
-        m_sampling = Program("attribute vec2 position; varying vec2 coordinate; void main() {"
-                             " coordinate = position * 0.5 + 0.5; gl_Position = vec4(position, 0.0, 1.0); }",
-                             "precision mediump float; uniform sampler2D picture; varying vec2 coordinate;"
-                             " void main() { gl_FragColor = texture2D(picture, coordinate); }");
-    }
-
-    static GLuint Program(const char* vertex, const char* fragment) {
-        const GLuint program = glCreateProgram();
-        for (GLenum type : {GL_VERTEX_SHADER, GL_FRAGMENT_SHADER}) {
-            const GLuint shader = glCreateShader(type);
-            glShaderSource(shader, 1, type == GL_VERTEX_SHADER ? &vertex : &fragment, nullptr);
-            glCompileShader(shader);
-            glAttachShader(program, shader);
-            glDeleteShader(shader);
-        }
-        glBindAttribLocation(program, 0, "position");
-        glLinkProgram(program);
-        return program;
-    }
-
-    static void DrawQuad(GLuint program) {
-        static const GLfloat QUAD[] = {-1, -1, 1, -1, -1, 1, 1, 1};
-        glUseProgram(program);
-        glEnableVertexAttribArray(0);
-        glVertexAttribPointer(0, 2, GL_FLOAT, GL_FALSE, 0, QUAD);
-        glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
+        m_eye_colours = LinkProgram("attribute vec2 position; varying float eye; void main() {"
+                                    " eye = uZpDepthShift.y; gl_Position = vec4(position, 0.0, 1.0); }",
+                                    "precision mediump float; varying float eye; void main() {"
+                                    " gl_FragColor = eye > 0.0 ? vec4(1, 0, 0, 1) : vec4(0, 1, 0, 1); }");
+        m_sampling = LinkProgram(SAMPLING_VERTEX_SHADER, SAMPLING_FRAGMENT_SHADER);
     }
 
     // An 8 x 8 render texture made as the game makes it, cleared blue and drawn over by
@@ -138,15 +114,14 @@ protected:
         glViewport(0, 0, 8, 8);
         glClearColor(0, 0, 1, 1);
         glClear(GL_COLOR_BUFFER_BIT);
-        DrawQuad(m_eye_colours);
+        DrawViewportQuad(m_eye_colours);
         const std::string halves = ColourAt(2, 4) + "|" + ColourAt(10, 4);
 
         glBindFramebuffer(GL_FRAMEBUFFER, 0);
         glViewport(0, 0, SURFACE_SIZE, SURFACE_SIZE);
         glClearColor(1, 1, 1, 1);
         glClear(GL_COLOR_BUFFER_BIT);
-        glBindTexture(GL_TEXTURE_2D, texture);
-        DrawQuad(m_sampling);
+        RenderTextureDraw{texture, framebuffer, m_sampling}.DrawToWindow();
         return "texture " + halves + ", eyes see " + ColourAt(8, 12) + "|" + ColourAt(8, 4);
     }
 
