@@ -17,6 +17,7 @@
 #include "support/device_files.h"
 #include "support/egl_session.h"
 #include "support/forwarding_check.h"
+#include "support/recorded_calls.h"
 #include "support/scenario_process.h"
 #include "support/vendor_root.h"
 
@@ -169,6 +170,84 @@ TEST(EglProfileTest, AProfileFileTurnsStereoOnForTheProcess) {
     EXPECT_TRUE(manager.m_es2_layer_installed);
     EXPECT_EQ(manager.m_profile->m_target_width, 800) << "the profile's size wins over the surface";
     EXPECT_NE(ReadReport().find("\tOpenGL ES 2.0\n"), std::string::npos);
+}
+
+// Run under the profile the caller installed: the mode and whether the manager interleaves,
+// then the viewport, scissor, stencil and draw calls of one draw of each version for every
+// split and eye order set through the control codes, one line per draw.
+TEST(EglProfileScenario, DISABLED_PrintEyeDrawsPerSplit) {
+    EglSession egl;
+    egl.Open();
+    const ovo::StereoManager& manager = ovo::StereoManager::instance();
+    std::printf("mode=0x%x interleave=%d\n", static_cast<unsigned>(manager.m_profile->ResolveMode()),
+                manager.m_interleave ? 1 : 0);
+    const char* const kept[] = {"glViewport(", "glScissor(", "glStencilFunc(", "glDrawArrays("};
+    for (EGLint version : {1, 2}) {
+        ASSERT_EQ(egl.MakeCurrent(egl.CreateContext(version)), EGL_TRUE);
+        for (GLint split : {ovo::STEREO_SPLIT_SIDE_BY_SIDE, ovo::STEREO_SPLIT_TOP_BOTTOM}) {
+            for (GLint order : {ovo::STEREO_EYE_ORDER_NORMAL, ovo::STEREO_EYE_ORDER_SWAPPED}) {
+                glTexParameteri(ovo::STEREO_PARAM_SPLIT, 0, split);
+                glTexParameteri(ovo::STEREO_PARAM_EYE_ORDER, 0, order);
+                ResetRecorder();
+                glDrawArrays(GL_TRIANGLES, 0, 3);
+                std::string line = "ES" + std::to_string(version) + ":";
+                for (const std::string& call : recorded_calls::RecordedGlCalls()) {
+                    for (const char* name : kept) {
+                        if (call.rfind(name, 0) == 0) line += " " + call;
+                    }
+                }
+                std::printf("%s\n", line.c_str());
+            }
+        }
+    }
+}
+
+// Every accepted profile of a shader mode interleaves, so its split and eye order (from the
+// file or the control codes) never reach a draw: both eyes keep the application's viewport
+// and scissor and differ only by their stencil reference. The plain mode draws once at the
+// scaled viewport, whatever they say.
+TEST(EglProfileTest, SplitAndEyeOrderChangeNoDraw) {
+    vendor_root::InstallRecorder();
+    // Top and bottom, eye order swapped, 800 x 480, with the shader conversion flag given.
+    auto profile = [](uint32_t shader_convert) {
+        return device_files::ProfileFile({{0x2403, {1}}, {0x2101, {0x3102}}, {0x2102, {0x3107}},
+                                          {0x2201, {800, 480}}, {0x2301, {shader_convert}}});
+    };
+    // Eye 0 passes where the mask holds 1, unless the profile keeps the mask's own eye
+    // order (the live-wallpaper presets do).
+    auto eyes = [](int eye0_reference) {
+        return ": glStencilFunc(0x0202, " + std::to_string(eye0_reference) +
+               ", 1) glDrawArrays(4, 0, 3) glStencilFunc(0x0202, " + std::to_string(1 - eye0_reference) +
+               ", 1) glDrawArrays(4, 0, 3)";
+    };
+    const struct {
+        const char* m_process;
+        std::string m_profile;  // empty: none installed
+        std::string m_mode;
+        std::string m_es1_draw;
+        std::string m_es2_draw;
+    } cases[] = {
+        {"com.example.game", profile(1), "mode=0x1002 interleave=1", eyes(1), eyes(1)},
+        {"com.rovio.angrybirds", profile(1), "mode=0x1003 interleave=1", eyes(1), eyes(1)},
+        {"com.android.wallpaper", "", "mode=0x1002 interleave=1", eyes(0), eyes(0)},
+        {"com.example.game", profile(0), "mode=0x1001 interleave=0",
+         ": glViewport(0, 0, 1280, 720) glScissor(0, 0, 1280, 720) glDrawArrays(4, 0, 3)",
+         ": glViewport(0, 0, 1280, 720) glDrawArrays(4, 0, 3)"},
+    };
+    for (const auto& each : cases) {
+        std::filesystem::remove_all(OVO_TEST_DEVICE_ROOT "/sdcard");
+        if (!each.m_profile.empty()) {
+            device_files::Write("/sdcard/stereoconv/game/stereo_gm.ovo", each.m_profile);
+        }
+        const ScenarioResult result =
+            RunScenario(each.m_process, "EglProfileScenario.DISABLED_PrintEyeDrawsPerSplit");
+        // The same draw for all four combinations.
+        std::string expected = each.m_mode + "\n";
+        for (int combination = 0; combination < 4; ++combination) expected += "ES1" + each.m_es1_draw + "\n";
+        for (int combination = 0; combination < 4; ++combination) expected += "ES2" + each.m_es2_draw + "\n";
+        EXPECT_NE(result.m_output.find(expected), std::string::npos)
+            << each.m_process << "\n" << result.m_output;
+    }
 }
 
 }  // namespace

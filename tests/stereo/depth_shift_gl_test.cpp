@@ -92,4 +92,42 @@ TEST_F(DepthShiftOnMesa, TheDeclarationFollowsTheLeadingVersionAndExtensionLines
     });
 }
 
+// The end of main is found by words and braces alone. An early return takes the statement
+// (a return without braces then no longer depends on its condition, and what main computes
+// after it is lost; with braces only the early path is shifted); a prototype starts main at
+// the next function or struct; a brace in a macro counts where it is written, not where the
+// macro is used.
+TEST_F(DepthShiftOnMesa, EarlyReturnsPrototypesAndMacrosMisplaceTheShift) {
+    const std::string head = "attribute vec4 p;\nuniform float u;\n";
+    const std::string unbraced = "void main() {\n    gl_Position = p;\n    if (u > 0.5) return;\n"
+                                 "    gl_Position.x = gl_Position.x + 1.0;\n}\n";
+    const std::string braced = "void main() {\n    gl_Position = p;\n    if (u > 0.5) { return; }\n"
+                               "    gl_Position.x = gl_Position.x + 1.0;\n}\n";
+    const std::string helper = "void main();\nvec4 position() { return p; }\n"
+                               "void main() { gl_Position = position(); }\n";
+    const std::string structure = "void main();\nstruct Light { vec4 colour; };\n"
+                                  "void main() { gl_Position = p; }\n";
+    const std::string main_macros = "#define BEGIN_MAIN void main() {\n#define END_MAIN }\n" + head +
+                                    "BEGIN_MAIN\n    gl_Position = p;\nEND_MAIN\n";
+    const std::string end_macro =
+        "#define END_MAIN }\n" + head + "void main() {\n    gl_Position = p;\nEND_MAIN\n";
+    auto before = [](const std::string& text, const std::string& at) {
+        std::string injected = DECLARATION + text;
+        return injected.insert(injected.find(at), STATEMENT);
+    };
+    ExpectCompiledAs({
+        {"a return without braces", GL_VERTEX_SHADER, {head.c_str(), unbraced.c_str()},
+         before(head + unbraced, "return;")},
+        {"a return in braces", GL_VERTEX_SHADER, {head.c_str(), braced.c_str()},
+         before(head + braced, "return;")},
+        {"a prototype, then a function", GL_VERTEX_SHADER, {head.c_str(), helper.c_str()},
+         before(head + helper, "return p;")},
+        {"a prototype, then a struct", GL_VERTEX_SHADER, {head.c_str(), structure.c_str()},
+         before(head + structure, "};"), false},
+        {"main begun and ended by macros", GL_VERTEX_SHADER, {main_macros.c_str()},
+         before(main_macros, "}\nattribute"), false},
+        {"main ended by a macro defined before it", GL_VERTEX_SHADER, {end_macro.c_str()}, end_macro},
+    });
+}
+
 }  // namespace

@@ -1,4 +1,5 @@
 // The OpenGL ES 1.x layers: the exact calls of one application draw in each path.
+#include <functional>
 #include <memory>
 
 #include "stereo/es1_scaled_layer.h"
@@ -214,6 +215,93 @@ TEST_F(Es1LayerTest, EachModeHasItsLayer) {
         layer->glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
         EXPECT_EQ(Only({"glDrawArrays"}).size(), each.m_draws) << each.m_mode;
         EXPECT_EQ(Only({"glGetFloatv"}).size(), each.m_queries) << each.m_mode;
+    }
+}
+
+// Overlay content still pending at a 3D draw is composed inside that draw's eye bracket,
+// with the mask test on: right after the mask is drawn (every swap) the mask's stencil
+// function, which passes nothing, is still set, and later in the frame eye 1's. Only the
+// composition at the swap reaches every column, and it is always two side-by-side halves
+// (640 x 720 within a draw, whatever the output size).
+TEST_F(Es1LayerTest, PendingOverlayIsComposedUnderTheStencilStateOfTheMoment) {
+    Interleave(true);
+    CreateOverlay();
+    Profile().m_shader_convert = true;
+    Blending(false, GL_ONE, GL_ZERO);
+    auto overlay_draw = [&] {
+        AnswerMatrix(GL_PROJECTION_MATRIX, ORTHO);
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    };
+    auto draw_3d = [&] {
+        AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    };
+    const struct {
+        const char* m_when;
+        std::function<void()> m_compose;
+        Calls m_quads;  // the stencil state and viewport of each composed quad
+    } cases[] = {
+        {"at the swap", [&] { eglSwapBuffers(m_egl.m_display, EglSession::Surface()); },
+         {"off glViewport(0, 0, 400, 480)", "off glViewport(400, 0, 400, 480)"}},
+        {"at the first 3D draw after the swap", draw_3d,
+         {"on glStencilFunc(0x0200, 0, 1) glViewport(0, 0, 640, 720)",
+          "on glStencilFunc(0x0200, 0, 1) glViewport(640, 0, 640, 720)"}},
+        // Eye 1 passes where the mask holds 0.
+        {"at a later 3D draw", draw_3d,
+         {"on glStencilFunc(0x0202, 0, 1) glViewport(0, 0, 640, 720)",
+          "on glStencilFunc(0x0202, 0, 1) glViewport(640, 0, 640, 720)"}},
+    };
+    // The state the vendor holds, followed through every case.
+    std::string test = "off";
+    std::string function;
+    std::string viewport;
+    for (const auto& each : cases) {
+        overlay_draw();
+        ResetRecorder();
+        each.m_compose();
+        Calls quads;
+        for (const std::string& call : RecordedGlCalls()) {
+            if (call == "glEnable(0x0B90)") test = "on";
+            if (call == "glDisable(0x0B90)") test = "off";
+            if (call.rfind("glStencilFunc(", 0) == 0) function = " " + call;
+            if (call.rfind("glViewport(", 0) == 0) viewport = " " + call;
+            if (call != "glDrawArrays(5, 0, 4)") continue;
+            quads.push_back(test + (test == "on" ? function : "") + viewport);
+        }
+        EXPECT_EQ(quads, each.m_quads) << each.m_when;
+    }
+}
+
+// A make-current without a context deletes the overlay's objects; they are made again only
+// after a new context or window surface. The same context and surface made current again
+// drop every overlay draw.
+TEST_F(Es1LayerTest, AfterAReleaseOnlyANewContextOrSurfaceBringsTheOverlayBack) {
+    Profile().m_eye_target = true;
+    AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
+    AnswerMatrix(GL_PROJECTION_MATRIX, ORTHO);
+    Blending(false, GL_ONE, GL_ZERO);
+    const EGLContext game = m_egl.CreateContext(1);
+    const struct {
+        const char* m_between;
+        std::function<EGLContext()> m_next;  // what is made current after the release
+        size_t m_draws;
+    } cases[] = {
+        {"nothing", [&] { return game; }, 0},
+        {"a new window surface",
+         [&] {
+             eglCreateWindowSurface(m_egl.m_display, nullptr, 0, nullptr);
+             return game;
+         },
+         1},
+        {"a new context", [&] { return m_egl.CreateContext(1); }, 1},
+    };
+    for (const auto& each : cases) {
+        ASSERT_EQ(m_egl.MakeCurrent(game), EGL_TRUE);
+        ASSERT_EQ(m_egl.MakeCurrent(EGL_NO_CONTEXT), EGL_TRUE);
+        ASSERT_EQ(m_egl.MakeCurrent(each.m_next()), EGL_TRUE);
+        ResetRecorder();
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        EXPECT_EQ(Only({"glDrawArrays"}).size(), each.m_draws) << each.m_between;
     }
 }
 

@@ -8,6 +8,39 @@
 
 #include <initializer_list>
 
+// A texture sampled over the quad of attribute 0 "position", which spans the viewport.
+constexpr char SAMPLING_VERTEX_SHADER[] =
+    "attribute vec2 position; varying vec2 coordinate;"
+    "void main() { coordinate = position * 0.5 + 0.5; gl_Position = vec4(position, 0.0, 1.0); }";
+constexpr char SAMPLING_FRAGMENT_SHADER[] =
+    "precision mediump float; uniform sampler2D picture; varying vec2 coordinate;"
+    "void main() { gl_FragColor = texture2D(picture, coordinate); }";
+
+// The program of the two shaders, with attribute 0 named "position", in the current context.
+inline GLuint LinkProgram(const char* vertex, const char* fragment) {
+    const GLuint program = glCreateProgram();
+    for (GLenum type : {GL_VERTEX_SHADER, GL_FRAGMENT_SHADER}) {
+        const GLuint shader = glCreateShader(type);
+        glShaderSource(shader, 1, type == GL_VERTEX_SHADER ? &vertex : &fragment, nullptr);
+        glCompileShader(shader);
+        glAttachShader(program, shader);
+        glDeleteShader(shader);
+    }
+    glBindAttribLocation(program, 0, "position");
+    glLinkProgram(program);
+    return program;
+}
+
+// Draws the quad of attribute 0 over the viewport with `program`.
+inline void DrawViewportQuad(GLuint program) {
+    static const GLfloat QUAD[] = {-1, -1, 1, -1, -1, 1, 1, 1};
+    glUseProgram(program);
+    glBindBuffer(GL_ARRAY_BUFFER, 0);
+    glEnableVertexAttribArray(0);
+    glVertexAttribPointer(0, 2, GL_FLOAT, GL_FALSE, 0, QUAD);
+    glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
+}
+
 struct RenderTextureDraw {
     GLuint m_texture = 0;
     GLuint m_framebuffer = 0;
@@ -25,34 +58,14 @@ struct RenderTextureDraw {
         glClearColor(0.5f, 0.25f, 0.75f, 1.0f);
         glClear(GL_COLOR_BUFFER_BIT);
         glBindFramebuffer(GL_FRAMEBUFFER, 0);
-        const char* vertex =
-            "attribute vec2 position; varying vec2 coordinate;"
-            "void main() { coordinate = position * 0.5 + 0.5; gl_Position = vec4(position, 0.0, 1.0); }";
-        const char* fragment =
-            "precision mediump float; uniform sampler2D picture; varying vec2 coordinate;"
-            "void main() { gl_FragColor = texture2D(picture, coordinate); }";
-        m_program = glCreateProgram();
-        for (GLenum type : {GL_VERTEX_SHADER, GL_FRAGMENT_SHADER}) {
-            const GLuint shader = glCreateShader(type);
-            glShaderSource(shader, 1, type == GL_VERTEX_SHADER ? &vertex : &fragment, nullptr);
-            glCompileShader(shader);
-            glAttachShader(m_program, shader);
-            glDeleteShader(shader);
-        }
-        glBindAttribLocation(m_program, 0, "position");
-        glLinkProgram(m_program);
+        m_program = LinkProgram(SAMPLING_VERTEX_SHADER, SAMPLING_FRAGMENT_SHADER);
     }
 
     // Samples the texture over the whole window (framebuffer 0) of the current context.
     void DrawToWindow() const {
-        static const GLfloat QUAD[] = {-1, -1, 1, -1, -1, 1, 1, 1};
         glBindFramebuffer(GL_FRAMEBUFFER, 0);
-        glUseProgram(m_program);
         glBindTexture(GL_TEXTURE_2D, m_texture);
-        glBindBuffer(GL_ARRAY_BUFFER, 0);
-        glEnableVertexAttribArray(0);
-        glVertexAttribPointer(0, 2, GL_FLOAT, GL_FALSE, 0, QUAD);
-        glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
+        DrawViewportQuad(m_program);
     }
 };
 
