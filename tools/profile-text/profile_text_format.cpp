@@ -83,16 +83,17 @@ std::string FormatFloat(float value) {
     return text;
 }
 
-std::string FormatProfileText(const ProfileTable& table, const ovo::ProfileReadResult& read,
-                              const char* process_name, size_t trailing_bytes) {
+std::string FormatProfileText(const ProfileTable& table, const ovo::ProfileReadResult& read, const char* process_name,
+                              size_t trailing_bytes) {
     std::string text;
     const bool applies = table.m_validity != 0;
     if (!applies) text += "# validity word is 0: nothing in this file applies (the lines below are not applied)\n";
     if (!read.m_header_complete) {
         text += "# the file is shorter than its 16-byte header\n";
     } else if (read.m_truncated) {
-        text += FormatText("# the file ends inside item %d of %d; what arrived of it is kept, later items are missing\n",
-                           read.m_complete_items + 1, ovo::PROFILE_FILE_ITEMS);
+        text +=
+            FormatText("# the file ends inside item %d of %d; what arrived of it is kept, later items are missing\n",
+                       read.m_complete_items + 1, ovo::PROFILE_FILE_ITEMS);
     } else if (trailing_bytes > 0) {
         text += FormatText("# %zu bytes after the 24th item are not read\n", trailing_bytes);
     }
@@ -105,7 +106,8 @@ std::string FormatProfileText(const ProfileTable& table, const ovo::ProfileReadR
             text += FormatText("# item %d (id 0x%04" PRIX32 "): negative count %d, no payload is read\n", index + 1,
                                item.m_id, item.m_data_count);
         } else if (item.m_data_count > capacity) {
-            text += FormatText("# item %d (id 0x%04" PRIX32 "): count %d exceeds the slot; the first %d %s are read, the "
+            text += FormatText("# item %d (id 0x%04" PRIX32
+                               "): count %d exceeds the slot; the first %d %s are read, the "
                                "rest is skipped\n",
                                index + 1, item.m_id, item.m_data_count, capacity, words ? "words" : "bytes");
         }
@@ -118,7 +120,9 @@ std::string FormatProfileText(const ProfileTable& table, const ovo::ProfileReadR
     for (int field_index = 0; field_index < FIELD_COUNT; ++field_index) {
         const Field& field = FIELDS[field_index];
         bool present = false;
-        for (int index = 0; index < ovo::PROFILE_FILE_ITEMS; ++index) present |= table.m_items[index].m_id == field.m_id;
+        for (int index = 0; index < ovo::PROFILE_FILE_ITEMS; ++index) {
+            present |= table.m_items[index].m_id == field.m_id;
+        }
         if (present) text += FormatText("%s%s = %s\n", prefix, field.m_name, FormatValue(field, fields).c_str());
     }
     for (int index = 0; index < ovo::PROFILE_FILE_ITEMS; ++index) {

@@ -42,7 +42,8 @@ bool ParseFieldValue(const Field& field, const std::string& text, uint32_t& word
             return false;
         default: {
             if (EnumValueOf(field.m_kind, text, word)) return true;
-            const bool numeric = !text.empty() && (std::isdigit(static_cast<unsigned char>(text[0])) || text[0] == '-' || text[0] == '+');
+            const bool numeric = !text.empty() && (std::isdigit(static_cast<unsigned char>(text[0])) ||
+                                                   text[0] == '-' || text[0] == '+');
             if (!numeric) {
                 problem = FormatText("unknown value '%s' for %s (expected %s)", text.c_str(), field.m_name,
                                      KindDescription(field.m_kind));
@@ -60,10 +61,23 @@ bool ParseFieldValue(const Field& field, const std::string& text, uint32_t& word
         return false;
     }
     if (status == NumberStatus::OUT_OF_RANGE) {
-        problem = FormatText("value %s out of range for %s (%s)", text.c_str(), field.m_name, KindDescription(field.m_kind));
+        problem =
+            FormatText("value %s out of range for %s (%s)", text.c_str(), field.m_name, KindDescription(field.m_kind));
         return false;
     }
     return true;
+}
+
+// A whole number of an item's line; `what` names it in the message ("the item id"),
+// `bits` its size.
+bool ParseItemNumber(const std::string& text, int64_t minimum, int64_t maximum, const char* what, int bits,
+                     int64_t& number, std::string& problem) {
+    const NumberStatus status = ParseInteger(text, minimum, maximum, number);
+    if (status == NumberStatus::OK) return true;
+    problem = status == NumberStatus::MALFORMED
+                  ? FormatText("malformed number '%s' for %s", text.c_str(), what)
+                  : FormatText("value %s out of range for %s (%d bits)", text.c_str(), what, bits);
+    return false;
 }
 
 // `item = ID TYPE ARGS`: words for the word types, one quoted string for text, the count
@@ -75,13 +89,7 @@ bool ParseRawItem(const std::string& value, ProfileItem& item, std::string& prob
         return false;
     }
     int64_t number = 0;
-    NumberStatus status = ParseInteger(words[0], 0, UINT32_MAX, number);
-    if (status != NumberStatus::OK) {
-        problem = FormatText(status == NumberStatus::MALFORMED ? "malformed number '%s' for the item id"
-                                                               : "value %s out of range for the item id (32 bits)",
-                             words[0].c_str());
-        return false;
-    }
+    if (!ParseItemNumber(words[0], 0, UINT32_MAX, "the item id", 32, number, problem)) return false;
     item.m_id = static_cast<uint32_t>(number);
     if (item.m_id == 0) {
         problem = "item id 0 is the padding id; write pads by itself";
@@ -92,13 +100,7 @@ bool ParseRawItem(const std::string& value, ProfileItem& item, std::string& prob
                              field->m_name);
         return false;
     }
-    status = ParseInteger(words[1], INT16_MIN, UINT16_MAX, number);
-    if (status != NumberStatus::OK) {
-        problem = FormatText(status == NumberStatus::MALFORMED ? "malformed number '%s' for the item type"
-                                                               : "value %s out of range for the item type (16 bits)",
-                             words[1].c_str());
-        return false;
-    }
+    if (!ParseItemNumber(words[1], INT16_MIN, UINT16_MAX, "the item type", 16, number, problem)) return false;
     item.m_data_type = static_cast<int16_t>(static_cast<uint16_t>(number));
     const size_t arguments = words.size() - 2;
     if (IsWordType(item.m_data_type)) {
@@ -108,11 +110,7 @@ bool ParseRawItem(const std::string& value, ProfileItem& item, std::string& prob
             return false;
         }
         for (size_t index = 0; index < arguments; ++index) {
-            status = ParseInteger(words[2 + index], INT32_MIN, UINT32_MAX, number);
-            if (status != NumberStatus::OK) {
-                problem = FormatText(status == NumberStatus::MALFORMED ? "malformed number '%s' for an item word"
-                                                                       : "value %s out of range for an item word (32 bits)",
-                                     words[2 + index].c_str());
+            if (!ParseItemNumber(words[2 + index], INT32_MIN, UINT32_MAX, "an item word", 32, number, problem)) {
                 return false;
             }
             item.m_data[index] = static_cast<uint32_t>(number);
@@ -136,13 +134,7 @@ bool ParseRawItem(const std::string& value, ProfileItem& item, std::string& prob
             problem = "an item of a type without payload takes its count: item = ID TYPE COUNT";
             return false;
         }
-        status = ParseInteger(words[2], INT16_MIN, INT16_MAX, number);
-        if (status != NumberStatus::OK) {
-            problem = FormatText(status == NumberStatus::MALFORMED ? "malformed number '%s' for the item count"
-                                                                   : "value %s out of range for the item count (16 bits)",
-                                 words[2].c_str());
-            return false;
-        }
+        if (!ParseItemNumber(words[2], INT16_MIN, INT16_MAX, "the item count", 16, number, problem)) return false;
         item.m_data_count = static_cast<int16_t>(number);
     }
     return true;
@@ -150,8 +142,7 @@ bool ParseRawItem(const std::string& value, ProfileItem& item, std::string& prob
 
 }  // namespace
 
-bool ParseProfileText(const std::string& text, const std::string& file_name, ProfileTable& table,
-                      std::string& error) {
+bool ParseProfileText(const std::string& text, const std::string& file_name, ProfileTable& table, std::string& error) {
     std::memset(&table, 0, sizeof(table));
     uint32_t field_words[FIELD_COUNT] = {};
     int field_lines[FIELD_COUNT] = {};
@@ -208,7 +199,8 @@ bool ParseProfileText(const std::string& text, const std::string& file_name, Pro
         if (field == nullptr) return fail(line_number, "unknown field '" + name + "'");
         const int index = static_cast<int>(field - FIELDS);
         if (field_lines[index] != 0) {
-            return fail(line_number, FormatText("duplicate field '%s' (first set on line %d)", name.c_str(), field_lines[index]));
+            return fail(line_number,
+                        FormatText("duplicate field '%s' (first set on line %d)", name.c_str(), field_lines[index]));
         }
         if (!ParseFieldValue(*field, value, field_words[index], problem)) return fail(line_number, problem);
         field_lines[index] = line_number;

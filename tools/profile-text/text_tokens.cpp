@@ -128,11 +128,13 @@ std::vector<std::string> SplitWords(const std::string& text) {
 NumberStatus ParseInteger(const std::string& text, int64_t minimum, int64_t maximum, int64_t& value) {
     if (text.empty()) return NumberStatus::MALFORMED;
     size_t start = (text[0] == '-' || text[0] == '+') ? 1 : 0;
-    const bool hex = text.size() > start + 2 && text[start] == '0' && (text[start + 1] == 'x' || text[start + 1] == 'X');
+    const bool hex =
+        text.size() > start + 2 && text[start] == '0' && (text[start + 1] == 'x' || text[start + 1] == 'X');
     const size_t digits = start + (hex ? 2 : 0);
     if (digits >= text.size()) return NumberStatus::MALFORMED;
     for (size_t index = digits; index < text.size(); ++index) {
-        if (!(hex ? std::isxdigit(static_cast<unsigned char>(text[index])) : std::isdigit(static_cast<unsigned char>(text[index])))) {
+        if (!(hex ? std::isxdigit(static_cast<unsigned char>(text[index]))
+                  : std::isdigit(static_cast<unsigned char>(text[index])))) {
             return NumberStatus::MALFORMED;
         }
     }
@@ -190,9 +192,7 @@ bool ParseQuoted(const std::string& text, std::string& bytes, std::string& probl
                 index += 2;
                 break;
             }
-            default:
-                problem = FormatText("unknown escape '\\%c'", escape);
-                return false;
+            default: problem = FormatText("unknown escape '\\%c'", escape); return false;
         }
     }
     return true;
