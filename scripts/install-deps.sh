@@ -5,7 +5,9 @@ packages=(g++ cmake make python3 binutils pkg-config libpng-dev patchelf
   libgtest-dev libbenchmark-dev
   libegl-dev libgles-dev libegl-mesa0 libgl1-mesa-dri
   # The third-party programs in stereo and their X server.
-  glmark2-es2-x11 mesa-utils libsdl2-tests xvfb x11-xserver-utils)
+  glmark2-es2-x11 mesa-utils libsdl2-tests xvfb x11-xserver-utils
+  # ovo-tune's preview window and its font; its tests press keys and take screenshots.
+  libsdl2-dev libsdl2-ttf-dev fonts-dejavu-core xdotool imagemagick)
 # Installed for this machine's architecture (or for all): on a machine that also holds
 # another architecture's copy (scripts/armhf.sh), an unqualified name is ambiguous to dpkg.
 native="$(dpkg --print-architecture)"
