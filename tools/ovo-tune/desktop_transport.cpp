@@ -24,12 +24,13 @@ constexpr char FRAME_FILE[] = "frame.png";
 constexpr size_t PANEL_READ_BYTES = 4096;
 
 // This process's environment with the variables that route the program through the
-// library copy, each kept behind what ovo-tune puts first.
+// library copy: put first, what the variable held kept behind a separator (or replaced),
+// and a variable without a value of ovo-tune's removed.
 std::vector<std::string> ProgramEnvironment(const DesktopSetup& setup, const std::string& frame_path) {
     struct Routed {
         const char* m_name;
         std::string m_first;
-        const char* m_separator;  // before what the variable held; null: replaced
+        const char* m_separator;  // before what the variable held; null: that is replaced
     };
     const Routed routed[] = {
         {"LD_LIBRARY_PATH", setup.m_library_dir, ":"},
