@@ -26,8 +26,6 @@ class AdbTransport final : public TuneTransport {
 public:
     explicit AdbTransport(const AdbSetup& setup);
     ~AdbTransport() override;
-    AdbTransport(const AdbTransport&) = delete;
-    AdbTransport& operator=(const AdbTransport&) = delete;
 
     std::string Place() const override;
     bool InstallProfile(const std::vector<uint8_t>& bytes, std::string* problem) override;

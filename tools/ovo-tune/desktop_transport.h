@@ -35,8 +35,6 @@ class DesktopTransport final : public TuneTransport {
 public:
     explicit DesktopTransport(const DesktopSetup& setup);
     ~DesktopTransport() override;
-    DesktopTransport(const DesktopTransport&) = delete;
-    DesktopTransport& operator=(const DesktopTransport&) = delete;
 
     std::string Place() const override;
     bool InstallProfile(const std::vector<uint8_t>& bytes, std::string* problem) override;

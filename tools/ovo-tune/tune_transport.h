@@ -19,7 +19,10 @@ enum FrameStatus {
 
 class TuneTransport {
 public:
+    TuneTransport() = default;
     virtual ~TuneTransport() = default;
+    TuneTransport(const TuneTransport&) = delete;
+    TuneTransport& operator=(const TuneTransport&) = delete;
 
     // What the session reports as the place it works in ("device root /x", "the device").
     virtual std::string Place() const = 0;
