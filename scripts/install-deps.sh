@@ -7,7 +7,9 @@ packages=(g++ cmake make python3 binutils pkg-config libpng-dev patchelf
   # The third-party programs in stereo and their X server.
   glmark2-es2-x11 mesa-utils libsdl2-tests xvfb x11-xserver-utils
   # The OpenGL ES 1.x program taken out of the piglit package needs these beside it.
-  libwaffle-1-0 libgl1 libxkbcommon0)
+  libwaffle-1-0 libgl1 libxkbcommon0
+  # ovo-tune's preview window and its font; its tests press keys and take screenshots.
+  libsdl2-dev libsdl2-ttf-dev fonts-dejavu-core xdotool imagemagick)
 # Installed for this machine's architecture (or for all): on a machine that also holds
 # another architecture's copy (scripts/armhf.sh), an unqualified name is ambiguous to dpkg.
 native="$(dpkg --print-architecture)"

@@ -5,13 +5,14 @@
 #                                 UndefinedBehaviorSanitizer, then the whole test suite
 #   scripts/sanitize.sh thread    the tests that start threads, under ThreadSanitizer
 #   scripts/sanitize.sh           both
-# Every finding fails its test. What is suppressed (Mesa's own, never ours) is listed with
-# its reason in tests/sanitizers/tsan.supp.
+# Every finding fails its test. What is suppressed (other libraries' own, never ours) is
+# listed with its reason in tests/sanitizers/tsan.supp and lsan.supp.
 set -euo pipefail
 root="$(cd "$(dirname "$0")/.." && pwd)"
 build="${OVO_BUILD_DIR:-$root/build}"
 build_root="$(dirname "$build")"
 thread_suppressions="$root/tests/sanitizers/tsan.supp"
+leak_suppressions="$root/tests/sanitizers/lsan.supp"
 kinds=("$@")
 [ ${#kinds[@]} -gt 0 ] || kinds=(address thread)
 bash "$root/scripts/install-deps.sh"
@@ -36,6 +37,7 @@ for kind in "${kinds[@]}"; do
       export ASAN_OPTIONS="detect_leaks=1:check_initialization_order=1:strict_init_order=1"
       export ASAN_OPTIONS="$ASAN_OPTIONS:intercept_tls_get_addr=0"
       export UBSAN_OPTIONS="print_stacktrace=1:halt_on_error=1"
+      export LSAN_OPTIONS="suppressions=$leak_suppressions"
       configure "$dir" address,undefined
       cmake --build "$dir" -j"$(nproc)"
       # Mesa's driver stays loaded to the leak check (see keep_libraries_loaded.cpp). The

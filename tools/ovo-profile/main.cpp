@@ -1,17 +1,15 @@
 // ovo-profile: shows a binary stereo profile file as text and writes one from text.
 //   ovo-profile show FILE [--process NAME]
 //   ovo-profile write TEXT_FILE -o FILE
-#include <fcntl.h>
-#include <sys/stat.h>
-#include <unistd.h>
-
 #include <cerrno>
 #include <cstdio>
 #include <cstring>
 #include <string>
 
+#include "atomic_file.h"
 #include "config/profile_file.h"
-#include "profile_text.h"
+#include "profile_text_format.h"
+#include "profile_text_parse.h"
 
 namespace {
 
@@ -127,39 +125,6 @@ bool ReadText(const char* file_name, std::string& text) {
     return !failed;
 }
 
-// Writes `size` bytes to a temporary file in `path`'s folder and renames it to `path`, so
-// that `path` is either left as it was or replaced as a whole.
-bool WriteAtomically(const std::string& path, const uint8_t* bytes, size_t size, std::string& problem) {
-    const size_t slash = path.rfind('/');
-    const std::string folder = slash == std::string::npos ? "." : path.substr(0, slash + 1);
-    const std::string base = slash == std::string::npos ? path : path.substr(slash + 1);
-    std::string temporary = (slash == std::string::npos ? "" : folder) + "." + base + ".XXXXXX";
-    int descriptor = mkstemp(&temporary[0]);
-    if (descriptor < 0) {
-        problem = "cannot create a temporary file next to " + path + ": " + std::strerror(errno);
-        return false;
-    }
-    // The permissions that a plainly created file would get.
-    const mode_t mask = umask(0);
-    umask(mask);
-    bool written = fchmod(descriptor, 0666 & ~mask) == 0;
-    size_t done = 0;
-    while (written && done < size) {
-        const ssize_t count = write(descriptor, bytes + done, size - done);
-        if (count < 0 && errno == EINTR) continue;
-        written = count > 0;
-        if (written) done += static_cast<size_t>(count);
-    }
-    const int saved = errno;
-    written = close(descriptor) == 0 && written;
-    if (!written || std::rename(temporary.c_str(), path.c_str()) != 0) {
-        problem = "cannot write " + path + ": " + std::strerror(written ? errno : saved);
-        unlink(temporary.c_str());
-        return false;
-    }
-    return true;
-}
-
 int Write(int argc, char** argv) {
     const char* text_name = nullptr;
     const char* output = nullptr;
@@ -202,7 +167,7 @@ int Write(int argc, char** argv) {
         std::fprintf(stderr, "ovo-profile: %s: the items do not fit a profile file\n", shown_name.c_str());
         return EXIT_BAD_INPUT;
     }
-    if (!WriteAtomically(output, bytes, size, error)) {
+    if (!ovo_profile::WriteFileAtomically(output, bytes, size, error)) {
         std::fprintf(stderr, "ovo-profile: %s\n", error.c_str());
         return EXIT_BAD_INPUT;
     }
