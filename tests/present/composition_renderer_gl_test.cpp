@@ -1,10 +1,12 @@
-// The column mask on Mesa, reached through the library: the pixel columns it marks and the
-// application state it leaves alone, in both drawing paths.
+// The library's own drawing on Mesa, reached through the library: the pixel columns the
+// column mask marks, and the application state that the mask (in both drawing paths) and
+// the overlay's composition leave alone.
 #include <GLES/gl.h>
 #include <GLES/glext.h>
 #include <GLES2/gl2.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <iterator>
 #include <ostream>
@@ -14,6 +16,8 @@
 
 #include "core/stereo_manager.h"
 #include "present/composition_renderer.h"
+#include "stereo/draw_call.h"
+#include "stereo/overlay_target.h"
 #include "support/mesa_context.h"
 
 namespace {
@@ -241,15 +245,28 @@ void SetGl1ApplicationState() {
 
 class StateOnMesa : public CompositionOnMesa {
 protected:
-    // Present with the application's state set, then every probe reads what it read before.
-    void ExpectStateKept(const Probe* own, size_t own_count) {
+    // `own` and the shared probes, but for `left_as_drawn`.
+    static std::vector<Probe> Probes(const Probe* own, size_t own_count, GLenum left_as_drawn = GL_NONE) {
         std::vector<Probe> probes(own, own + own_count);
         probes.insert(probes.end(), std::begin(SHARED_PROBES), std::end(SHARED_PROBES));
+        probes.erase(std::remove_if(probes.begin(), probes.end(),
+                                    [&](const Probe& probe) { return probe.m_name == left_as_drawn; }),
+                     probes.end());
+        return probes;
+    }
+
+    // `draw` with the application's state set; then every probe reads what it read before.
+    template <typename Draw>
+    static void ExpectStateKept(const std::vector<Probe>& probes, Draw draw) {
         std::vector<std::vector<double>> before;
         for (const Probe& probe : probes) before.push_back(probe.Read());
-        Present();
+        draw();
         for (size_t i = 0; i < probes.size(); ++i)
             EXPECT_EQ(probes[i].Read(), before[i]) << probes[i].m_label;
+    }
+
+    void ExpectPresentKeepsState(const Probe* own, size_t own_count) {
+        ExpectStateKept(Probes(own, own_count), [this] { Present(); });
         ExpectMaskOn(1);  // and the mask was really drawn, where MaskColumnsOnMesa finds it
     }
 };
@@ -258,7 +275,43 @@ TEST_F(StateOnMesa, TheGl1PathLeavesTheApplicationsStateAsItWas) {
     Open(PATH_GL1, 64, 32);
     SetSharedApplicationState();
     SetGl1ApplicationState();
-    ExpectStateKept(GL1_PROBES, std::size(GL1_PROBES));
+    ExpectPresentKeepsState(GL1_PROBES, std::size(GL1_PROBES));
+}
+
+// The overlay, cleared to red, composed once and into both halves: the window turns red and
+// the application's state comes back, but for the scissor box, which stays as drawn.
+TEST_F(StateOnMesa, TheOverlayCompositionLeavesTheApplicationsStateAsItWas) {
+    Open(PATH_GL1, 64, 32);
+    ovo::StereoManager& manager = ovo::StereoManager::instance();
+    manager.m_profile->m_eye_shift = 0.0f;
+    ovo::OverlayTarget overlay(64, 32, ovo::OVERLAY_CREATE_OBJECTS);
+    overlay.Create();
+    const std::pair<const char*, void (*)(ovo::OverlayTarget&)> compositions[] = {
+        {"single", [](ovo::OverlayTarget& target) { target.ComposeSingle(0, 0, 64, 32, 0, 1); }},
+        {"stereo", [](ovo::OverlayTarget& target) {
+             target.ComposeStereo(ovo::StereoManager::instance(), 0, 0, 32, 32, 0, 1);
+         }},
+    };
+    for (const auto& [label, compose] : compositions) {
+        SCOPED_TRACE(label);
+        manager.m_viewport = manager.m_scissor = {0, 0, 64, 32};
+        glDisable(GL_SCISSOR_TEST);
+        glColorMask(GL_TRUE, GL_TRUE, GL_TRUE, GL_TRUE);
+        overlay.DrawInto(manager, ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 0));  // bound, holds content
+        glClearColor(1, 0, 0, 1);
+        glClear(GL_COLOR_BUFFER_BIT);
+        overlay.Unbind();
+        glClearColor(0, 0, 1, 1);
+        glClear(GL_COLOR_BUFFER_BIT);
+        SetSharedApplicationState();
+        SetGl1ApplicationState();
+        ExpectStateKept(Probes(GL1_PROBES, std::size(GL1_PROBES), GL_SCISSOR_BOX), [&] { compose(overlay); });
+        std::vector<GLubyte> pixels(64 * 32 * 4);
+        glReadPixels(0, 0, 64, 32, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
+        size_t red = 0;
+        for (size_t i = 0; i < pixels.size(); i += 4) red += pixels[i] == 255 && pixels[i + 2] == 0;
+        EXPECT_EQ(red, 64u * 32u);
+    }
 }
 
 // Attribute 0 as an application leaves it, unlike the mask's and GL's defaults.
@@ -296,7 +349,7 @@ TEST_F(StateOnMesa, TheGl2PathLeavesTheApplicationsStateAsItWas) {
         SetSharedApplicationState();
         glUseProgram(FillProgram());
         SetAttribute0(each);
-        ExpectStateKept(GL2_PROBES, std::size(GL2_PROBES));
+        ExpectPresentKeepsState(GL2_PROBES, std::size(GL2_PROBES));
     }
 }
 
