@@ -99,6 +99,14 @@ TEST_F(SwapBuffersTest, AFailedVendorSwapIsReportedAndTheRefreshStillRuns) {
     EXPECT_EQ(Swap(), (RecorderResult<EGLBoolean>(RECORDER_API_EGL, ovo::EGL_ENTRY_eglSwapBuffers)));
 }
 
+// Leaves a non-zero pattern where the next call's locals will lie, so that a value the
+// reader uses before it set it shows.
+__attribute__((noinline)) void DirtyTheStack() {
+    volatile float junk[4096];
+    for (size_t i = 0; i < 4096; ++i) junk[i] = 9.0f;
+    static_cast<void>(junk[0]);
+}
+
 TEST_F(SwapBuffersTest, TheLiveTuningFileSetsFourParameters) {
     struct Case {
         const char* m_text;
@@ -115,6 +123,7 @@ TEST_F(SwapBuffersTest, TheLiveTuningFileSetsFourParameters) {
     for (const Case& each : cases) {
         profile.m_eye_distance = profile.m_eye_angle = profile.m_eye_shift = profile.m_ramp_steps = 9.0f;
         device_files::Write("/sdcard/game_profile.txt", each.m_text);
+        DirtyTheStack();
         ovo::ReadLiveTuning(profile);
         const float got[4] = {profile.m_eye_distance, profile.m_eye_angle, profile.m_eye_shift,
                               profile.m_ramp_steps};
