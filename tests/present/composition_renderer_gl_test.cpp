@@ -278,39 +278,60 @@ TEST_F(StateOnMesa, TheGl1PathLeavesTheApplicationsStateAsItWas) {
     ExpectPresentKeepsState(GL1_PROBES, std::size(GL1_PROBES));
 }
 
-// The overlay, cleared to red, composed once and into both halves: the window turns red and
-// the application's state comes back, but for the scissor box, which stays as drawn.
-TEST_F(StateOnMesa, TheOverlayCompositionLeavesTheApplicationsStateAsItWas) {
+// The overlay, red on its left half and green on its right, composed once over the window
+// and into both halves with an eye shift of 8 pixels: each eye's quad is 40 pixels wide, eye
+// 0's from the left edge of its half, eye 1's from 8 pixels left of it, so the colours meet
+// at column 20 of eye 0's half and column 12 of eye 1's. The application's state comes back,
+// but for the scissor box, which stays as drawn.
+TEST_F(StateOnMesa, TheOverlayCompositionPlacesEachEyeAndLeavesTheApplicationsState) {
     Open(PATH_GL1, 64, 32);
     ovo::StereoManager& manager = ovo::StereoManager::instance();
-    manager.m_profile->m_eye_shift = 0.0f;
+    manager.m_profile->m_eye_shift = 8.0f / 400.0f;
     ovo::OverlayTarget overlay(64, 32, ovo::OVERLAY_CREATE_OBJECTS);
     overlay.Create();
-    const std::pair<const char*, void (*)(ovo::OverlayTarget&)> compositions[] = {
-        {"single", [](ovo::OverlayTarget& target) { target.ComposeSingle(0, 0, 64, 32, 0, 1); }},
-        {"stereo", [](ovo::OverlayTarget& target) {
-             target.ComposeStereo(ovo::StereoManager::instance(), 0, 0, 32, 32, 0, 1);
-         }},
+    const struct {
+        const char* m_label;
+        void (*m_compose)(ovo::OverlayTarget&);
+        int m_red_columns[2];  // in the window's left and right half; green in the rest
+    } cases[] = {
+        {"single", [](ovo::OverlayTarget& target) { target.ComposeSingle(0, 0, 64, 32, 0, 1); }, {32, 0}},
+        {"stereo",
+         [](ovo::OverlayTarget& target) { target.ComposeStereo(ovo::StereoManager::instance(), 0, 0, 32, 32, 0, 1); },
+         {20, 12}},
     };
-    for (const auto& [label, compose] : compositions) {
-        SCOPED_TRACE(label);
+    for (const auto& each : cases) {
+        SCOPED_TRACE(each.m_label);
         manager.m_viewport = manager.m_scissor = {0, 0, 64, 32};
-        glDisable(GL_SCISSOR_TEST);
         glColorMask(GL_TRUE, GL_TRUE, GL_TRUE, GL_TRUE);
         overlay.DrawInto(manager, ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 0));  // bound, holds content
-        glClearColor(1, 0, 0, 1);
-        glClear(GL_COLOR_BUFFER_BIT);
+        glEnable(GL_SCISSOR_TEST);
+        for (const auto& [x, green] : {std::pair{0, 0.0f}, std::pair{32, 1.0f}}) {
+            glScissor(x, 0, 32, 32);
+            glClearColor(1 - green, green, 0, 1);
+            glClear(GL_COLOR_BUFFER_BIT);
+        }
         overlay.Unbind();
+        glDisable(GL_SCISSOR_TEST);
         glClearColor(0, 0, 1, 1);
         glClear(GL_COLOR_BUFFER_BIT);
         SetSharedApplicationState();
         SetGl1ApplicationState();
-        ExpectStateKept(Probes(GL1_PROBES, std::size(GL1_PROBES), GL_SCISSOR_BOX), [&] { compose(overlay); });
+        ExpectStateKept(Probes(GL1_PROBES, std::size(GL1_PROBES), GL_SCISSOR_BOX), [&] { each.m_compose(overlay); });
         std::vector<GLubyte> pixels(64 * 32 * 4);
         glReadPixels(0, 0, 64, 32, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
-        size_t red = 0;
-        for (size_t i = 0; i < pixels.size(); i += 4) red += pixels[i] == 255 && pixels[i + 2] == 0;
-        EXPECT_EQ(red, 64u * 32u);
+        for (int half = 0; half < 2; ++half) {
+            int red = 0;
+            int green = 0;
+            for (int y = 0; y < 32; ++y) {
+                for (int x = 32 * half; x < 32 * half + 32; ++x) {
+                    const GLubyte* pixel = &pixels[(static_cast<size_t>(y) * 64 + x) * 4];
+                    red += pixel[0] > 200 && pixel[1] < 50 && pixel[2] < 50;
+                    green += pixel[1] > 200 && pixel[0] < 50 && pixel[2] < 50;
+                }
+            }
+            EXPECT_EQ(red, each.m_red_columns[half] * 32) << "half " << half;
+            EXPECT_EQ(green, (32 - each.m_red_columns[half]) * 32) << "half " << half;
+        }
     }
 }
 

@@ -1,6 +1,7 @@
 // The OpenGL ES 1.x layers: the exact calls of one application draw in each path.
 #include <memory>
 
+#include "egl/current_context.h"
 #include "present/viewer_tracker.h"
 #include "stereo/es1_scaled_layer.h"
 #include "stereo/es1_sprite_stereo_layer.h"
@@ -46,15 +47,15 @@ protected:
 TEST_F(Es1LayerTest, APerspectiveDrawMovesEachEyeAndItsImageBackThroughTheMask) {
     Interleave(true);
     AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
-    m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 6, 3);
     // Eye 0: T(-angle) P T(+distance); eye 1 negated. Eye 0 passes where the mask is 1.
     const Calls expected = Join(
         {MATRIX_QUERIES,
          {"glEnable(0x0B90)", "glMatrixMode(0x1701)", "glLoadIdentity()",
           "glTranslatef(-0.25, 0, 0)", "glMultMatrixf(ptr)", "glTranslatef(0.5, 0, 0)",
-          "glStencilFunc(0x0202, 1, 1)", "glDrawArrays(4, 0, 3)", "glMatrixMode(0x1701)",
+          "glStencilFunc(0x0202, 1, 1)", "glDrawArrays(4, 6, 3)", "glMatrixMode(0x1701)",
           "glLoadIdentity()", "glTranslatef(0.25, 0, 0)", "glMultMatrixf(ptr)",
-          "glTranslatef(-0.5, 0, 0)", "glStencilFunc(0x0202, 0, 1)", "glDrawArrays(4, 0, 3)",
+          "glTranslatef(-0.5, 0, 0)", "glStencilFunc(0x0202, 0, 1)", "glDrawArrays(4, 6, 3)",
           "glDisable(0x0B90)"},
          MATRIX_RESTORE});
     EXPECT_EQ(RecordedGlCalls(), expected);
@@ -222,6 +223,26 @@ TEST_F(Es1LayerTest, TheMaskTestIsOnBeforeThePendingOverlayIsComposed) {
     }
 }
 
+// A surface made current again after the first swap gets the mask at its first stereo
+// draw (before the pair), and only then; a clear of the stencil alone keeps its colour.
+TEST_F(Es1LayerTest, ASurfaceMadeCurrentAgainIsMaskedAtItsFirstStereoDraw) {
+    Interleave(true);
+    AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
+    Manager().m_composer->Present(Manager());  // the first swap builds the lines
+    const EGLContext context = ovo::CurrentContext();
+    ASSERT_EQ(m_egl.MakeCurrent(EGL_NO_CONTEXT), EGL_TRUE);
+    ASSERT_EQ(m_egl.MakeCurrent(context), EGL_TRUE);
+    for (const size_t masks : {1u, 0u}) {
+        ResetRecorder();
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        const Calls calls = Only({"glClear", "glDrawArrays"});
+        Calls expected(masks, "glClear(0x0400)");
+        if (masks != 0) expected.push_back("glDrawArrays(1, 0, 802)");
+        expected.insert(expected.end(), 2, "glDrawArrays(4, 0, 3)");
+        EXPECT_EQ(calls, expected);
+    }
+}
+
 // An off-centre glFrustumf(-1, 3, -1, 1, 1, 10) and an object 4 in front of the eye: its
 // origin lands at depth 2/3, which unprojects from the screen's centre to (4, 0, -4).
 TEST_F(Es1LayerTest, OnlyPerspectiveDrawsShowTheViewerTheNearestObject) {
@@ -383,6 +404,12 @@ TEST_F(Es1LayerTest, ThePlainModeComposesPendingOverlayOnceBeforeADraw) {
     EXPECT_EQ(Only({"glBindFramebufferOES", "glOrthof", "glViewport", "glDrawArrays", "glClear"}), expected);
     EXPECT_FALSE(Manager().m_overlay->HasContent());
     EXPECT_EQ(Manager().m_overlay->BoundFramebuffer(), 0u);
+    // Bound without content, the overlay is still unbound before the draw.
+    Manager().m_overlay->Bind();
+    ResetRecorder();
+    scaled.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    EXPECT_EQ(Only({"glBindFramebufferOES", "glDrawArrays"}),
+              (Calls{"glBindFramebufferOES(0x8D40, 0)", "glDrawArrays(4, 0, 3)"}));
 }
 
 TEST_F(Es1LayerTest, EachModeHasItsLayer) {

@@ -361,6 +361,15 @@ TEST_F(TrackedLayerTest, UntrackedNamesAndUnsizedTexturesAreNeverRespecified) {
                                          GL_TEXTURE_2D, each.m_texture, 0);
         EXPECT_EQ(RecordedGlCalls().size(), 1u) << each.m_texture;
     }
+    // Deleted while bound: the next image goes to texture 0, not to the forgotten name.
+    const GLuint deleted = 9;
+    m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, deleted);
+    m_tracked.glDeleteTextures(Manager(), 1, &deleted);
+    m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGBA, 32, 32, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, deleted);
+    ResetRecorder();
+    m_tracked.glFramebufferTexture2D(Manager(), GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, deleted, 0);
+    EXPECT_EQ(RecordedGlCalls().size(), 1u) << "deleted";
 }
 
 TEST_F(TrackedLayerTest, WideningPutsBackTheTextureTheApplicationHasBound) {
@@ -436,6 +445,15 @@ TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
                     "glBindFramebuffer", "glDrawArrays", "glBindTexture", "glUniform2f",
                     "glStencilFunc"}),
               expected);
+    // Eye 0's copy samples the left half, eye 1's the right: the first texture coordinates.
+    std::vector<GLfloat> first_coordinates;
+    const RecorderState& state = *RecorderGetState();
+    for (uint32_t i = 0; i < state.m_call_count; ++i) {
+        const RecordedCall& call = state.m_calls[i];
+        if (call.m_index == ovo::GL_ENTRY_glVertexAttribPointer && call.m_arguments[0] == 1 && call.m_arguments[5] != 0)
+            first_coordinates.push_back(reinterpret_cast<const GLfloat*>(call.m_arguments[5])[0]);
+    }
+    EXPECT_EQ(first_coordinates, (std::vector<GLfloat>{0.0f, 0.5f}));
 }
 
 // The eye textures belong to the context that drew: made there once, used there again

@@ -58,6 +58,17 @@ TEST_F(OverlayTargetTest, ARepeatedReleaseDeletesNothingTwice) {
     EXPECT_EQ(m_overlay.Framebuffer(), 7u);
 }
 
+// With the application's own framebuffer bound, overlay draws go there.
+TEST_F(OverlayTargetTest, DrawsKeepTheApplicationsFramebuffer) {
+    m_overlay.Create();
+    m_overlay.SetBoundFramebuffer(5);
+    ResetRecorder();
+    m_overlay.DrawInto(Manager(), ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 3));
+    EXPECT_EQ(RecordedGlCalls(), (Calls{"glViewport(0, 0, 800, 480)", "glScissor(0, 0, 800, 480)",
+                                        "glDrawArrays(4, 0, 3)"}));
+    EXPECT_EQ(m_overlay.BoundFramebuffer(), 5u);
+}
+
 TEST_F(OverlayTargetTest, ClearKeepsTheBindingTheApplicationBelievesIn) {
     m_overlay.Create();
     m_overlay.SetBoundFramebuffer(5);
@@ -119,6 +130,7 @@ TEST_F(OverlayTargetTest, FlushComposesPendingContentIntoBothHalvesAndPutsStateB
               (Calls{quads[0], quads[1], "glDrawArrays(5, 0, 4)", quads[2], quads[3],
                      "glDrawArrays(5, 0, 4)"}));
     EXPECT_EQ(calls[1 + 35], "glOrthof(0, 640, 720, 0, -1, 1)");
+    EXPECT_EQ(calls[53], "glBlendFunc(1, 0x0303)") << "the overlay holds premultiplied colour";
     EXPECT_FALSE(m_overlay.HasContent());
     // Nothing pending: a flush only unbinds.
     ResetRecorder();
