@@ -41,6 +41,7 @@ TEST(DebugConfig, WritesTheLogOnlyWhenSwitchedOn) {
         {Configuration("version=\"1.1\"", "true"), nullptr},
         {Configuration(on, "TRUE"), nullptr},
         {"<other " + on + "/>" + Configuration(on, "true"), nullptr},  // duoscope must come first
+        {"<debug " + on + "/>" + Configuration(on, "true"), nullptr},
         {"<a/> / " + Configuration(on, "true"), nullptr},
     };
     for (const auto& test : cases) {

@@ -11,6 +11,7 @@
 #include <vector>
 
 #include "core/stereo_manager.h"
+#include "egl/context_registry.h"
 #include "support/device_files.h"
 #include "support/egl_session.h"
 #include "support/forwarding_check.h"
@@ -205,6 +206,23 @@ TEST_F(CompositionRendererTest,
                          call.m_arguments[5] == ArgumentBits(m_renderer.Vertices());
     }
     EXPECT_EQ(line_pointers, 2);
+}
+
+// A context that the registry cannot follow (past its capacity) has no share group to keep
+// the mask's program for: each frame makes its own and deletes it.
+TEST_F(CompositionRendererTest, AContextOfNoKnownGroupDeletesItsProgramEachFrame) {
+    Start(PATH_GL2, 800, 480);
+    EGLContext last = EGL_NO_CONTEXT;
+    for (size_t i = 0; i < ovo::CONTEXT_REGISTRY_CAPACITY; ++i) last = m_egl.CreateContext(2);
+    ASSERT_EQ(m_egl.MakeCurrent(last), EGL_TRUE);
+    ASSERT_EQ(Manager().m_contexts->ShareGroupOf(last), ovo::SHARE_GROUP_NONE);
+    AnswerResult(ovo::GL_ENTRY_glCreateProgram, 0, 7);
+    ResetRecorder();
+    m_renderer.Present(Manager());
+    m_renderer.Present(Manager());
+    const std::vector<std::string> calls = RecordedGlCalls();
+    EXPECT_EQ(std::count(calls.begin(), calls.end(), "glCreateProgram()"), 2);
+    EXPECT_EQ(std::count(calls.begin(), calls.end(), "glDeleteProgram(7)"), 2);
 }
 
 TEST_F(CompositionRendererTest, OneGl1FrameSavesSetsDrawsAndRestoresInOrder) {

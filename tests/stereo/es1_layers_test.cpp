@@ -224,7 +224,8 @@ TEST_F(Es1LayerTest, TheMaskTestIsOnBeforeThePendingOverlayIsComposed) {
 }
 
 // A surface made current again after the first swap gets the mask at its first stereo
-// draw (before the pair), and only then; a clear of the stencil alone keeps its colour.
+// draw into it (before the pair), and only then; a clear of the stencil alone keeps its
+// colour.
 TEST_F(Es1LayerTest, ASurfaceMadeCurrentAgainIsMaskedAtItsFirstStereoDraw) {
     Interleave(true);
     AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
@@ -232,6 +233,12 @@ TEST_F(Es1LayerTest, ASurfaceMadeCurrentAgainIsMaskedAtItsFirstStereoDraw) {
     const EGLContext context = ovo::CurrentContext();
     ASSERT_EQ(m_egl.MakeCurrent(EGL_NO_CONTEXT), EGL_TRUE);
     ASSERT_EQ(m_egl.MakeCurrent(context), EGL_TRUE);
+    // Not while the application draws into its own framebuffer, which has no mask to hold.
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING_OES, {3});
+    ResetRecorder();
+    m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    EXPECT_EQ(Only({"glClear"}), Calls());
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING_OES, {0});
     for (const size_t masks : {1u, 0u}) {
         ResetRecorder();
         m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
