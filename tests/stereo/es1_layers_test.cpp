@@ -277,12 +277,7 @@ TEST_F(Es1LayerTest, OnlyPerspectiveDrawsShowTheViewerTheNearestObject) {
 // Eye 0's eye distance at three textures in a row: the ramp runs only while interleaving,
 // and in its OpenGL ES 1.x form (which ramps the shift for the z selector).
 TEST_F(Es1LayerTest, TheRampMovesInterleavedDrawsAtEachNewTexture) {
-    const struct {
-        uint32_t m_ramp;
-        bool m_interleave;
-        uint32_t m_param;
-        Calls m_distances;
-    } cases[] = {
+    const RampCase cases[] = {
         {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_X,
          {"glTranslatef(-0.04, 0, 0)", "glTranslatef(-0.03, 0, 0)", "glTranslatef(-0.02, 0, 0)"}},
         {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_Z, Calls(3, "glTranslatef(-0.04, 0, 0)")},
@@ -292,21 +287,11 @@ TEST_F(Es1LayerTest, TheRampMovesInterleavedDrawsAtEachNewTexture) {
     AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
     Profile().m_eye_distance_set = -0.04f;
     Profile().m_ramp_steps = 4.0f;
-    for (const auto& each : cases) {
-        Interleave(each.m_interleave);
-        Profile().m_ramp = each.m_ramp;
-        Profile().m_ramp_param = each.m_param;
+    for (const RampCase& each : cases) {
         Profile().m_eye_distance = 0.5f;
-        Manager().m_frame_draws = 0;
-        Manager().m_last_texture = 0;
-        Calls distances;
-        for (GLint texture = 1; texture <= 3; ++texture) {
-            AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {texture});
-            ResetRecorder();
-            m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-            distances.push_back(Only({"glTranslatef"}).at(1));
-        }
-        EXPECT_EQ(distances, each.m_distances) << std::hex << each.m_ramp << " " << each.m_param;
+        const Calls seen =
+            AtThreeTextures(each, [&] { m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3); }, "glTranslatef", 1);
+        EXPECT_EQ(seen, each.m_seen) << std::hex << each.m_ramp << " " << each.m_param;
     }
 }
 

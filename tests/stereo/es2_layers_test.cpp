@@ -117,12 +117,7 @@ TEST_F(Es2LayerTest, WithoutInterleavingEachEyeDrawsIntoItsHalf) {
 // Eye 0's (angle, distance) at three textures in a row: the ramp runs only while
 // interleaving, in its OpenGL ES 2.0 form (the z selector ramps the distance).
 TEST_F(Es2LayerTest, TheDirectSubmodeRampsInterleavedDrawsAtEachNewTexture) {
-    const struct {
-        uint32_t m_ramp;
-        bool m_interleave;
-        uint32_t m_param;
-        Calls m_uniforms;
-    } cases[] = {
+    const RampCase cases[] = {
         {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_X,
          {"glUniform2f(4, 0.25, -0.04)", "glUniform2f(4, 0.25, -0.03)", "glUniform2f(4, 0.25, -0.02)"}},
         {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_Z,
@@ -135,22 +130,12 @@ TEST_F(Es2LayerTest, TheDirectSubmodeRampsInterleavedDrawsAtEachNewTexture) {
     Profile().m_eye_distance_set = -0.04f;
     Profile().m_eye_angle_set = 0.25f;
     Profile().m_ramp_steps = 4.0f;
-    for (const auto& each : cases) {
-        Interleave(each.m_interleave);
-        Profile().m_ramp = each.m_ramp;
-        Profile().m_ramp_param = each.m_param;
+    for (const RampCase& each : cases) {
         Profile().m_eye_angle = 0.5f;
         Profile().m_eye_distance = 0.75f;
-        Manager().m_frame_draws = 0;
-        Manager().m_last_texture = 0;
-        Calls uniforms;
-        for (GLint texture = 1; texture <= 3; ++texture) {
-            AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {texture});
-            ResetRecorder();
-            m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-            uniforms.push_back(Only({"glUniform2f"}).at(0));
-        }
-        EXPECT_EQ(uniforms, each.m_uniforms) << std::hex << each.m_ramp << " " << each.m_param;
+        const Calls seen =
+            AtThreeTextures(each, [&] { m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3); }, "glUniform2f", 0);
+        EXPECT_EQ(seen, each.m_seen) << std::hex << each.m_ramp << " " << each.m_param;
     }
 }
 
