@@ -99,6 +99,10 @@ TEST_F(Es2LayerTest, AWindowDrawSetsEachEyesUniformThroughTheMask) {
     EXPECT_EQ(RecordedGlCalls(), expected);
     EXPECT_EQ(Manager().m_program, PROGRAM);
     EXPECT_EQ(Manager().m_depth_shift_location, LOCATION);
+    // The name the injected shaders declare.
+    const RecordedCall* lookup = FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glGetUniformLocation);
+    ASSERT_NE(lookup, nullptr);
+    EXPECT_STREQ(reinterpret_cast<const char*>(lookup->m_arguments[1]), "uZpDepthShift");
 }
 
 TEST_F(Es2LayerTest, WithoutInterleavingEachEyeDrawsIntoItsHalf) {

@@ -148,11 +148,14 @@ TEST(GlObjectTrackerTest, NamesPastTheTablesGetNoRecord) {
     tracker.ForgetTexture(99999);
     EXPECT_EQ(tracker.TextureRecordOf(12)->m_width, 0u);
 
-    // 3 and 67 share a slot: the second gets none rather than the first one's size.
+    // 3 and 67 share one of the 64 slots: the second gets none rather than the first one's size.
     ovo::FramebufferRecord* first = tracker.ClaimFramebufferRecord(3);
     ASSERT_NE(first, nullptr);
     first->m_width = 640;
     EXPECT_EQ(tracker.ClaimFramebufferRecord(67), nullptr);
+    ovo::FramebufferRecord* other = tracker.ClaimFramebufferRecord(35);  // a slot of its own
+    EXPECT_NE(other, nullptr);
+    EXPECT_NE(other, first);
     EXPECT_EQ(tracker.ClaimFramebufferRecord(3), first);
     EXPECT_EQ(tracker.ClaimFramebufferRecord(0), nullptr);
 }
