@@ -1,5 +1,7 @@
 // Drawing the collected overlay into the window with the fixed-function pipeline, with
 // the application's state saved before and put back after.
+#include <iterator>
+
 #include "core/gl_state_table.h"
 #include "core/raw_gl.h"
 #include "core/saturating_math.h"
@@ -9,39 +11,79 @@ namespace ovo {
 
 namespace {
 
-// What is saved before the quads, in query order; some items are set right after saving.
-const GlStateItem COMPOSE_SAVED[] = {
-    {GL_STATE_COLOR_MASK, 0, true, {GL_TRUE, GL_TRUE, GL_TRUE, GL_TRUE}},  // 0
-    {GL_STATE_DEPTH_MASK, 0, true, {GL_FALSE}},                            // 1
-    {GL_STATE_MATRIX_MODE, 0, false, {}},                                  // 2
-    {GL_STATE_BLEND_FUNC, 0, false, {}},                                   // 3
-    {GL_STATE_VIEWPORT, 0, false, {}},                                     // 4
-    {GL_STATE_ENABLE, GL_BLEND, false, {}},                                // 5
-    {GL_STATE_ENABLE, GL_DEPTH_TEST, false, {}},                           // 6
-    {GL_STATE_ENABLE, GL_TEXTURE_2D, false, {}},                           // 7
-    {GL_STATE_ENABLE, GL_LIGHTING, false, {}},                             // 8
-    {GL_STATE_TEXTURE_BINDING, 0, false, {}},                              // 9
-    {GL_STATE_TEX_ENV_MODE, 0, false, {}},                                 // 10
-    {GL_STATE_ARRAY_BUFFER, 0, false, {}},                                 // 11
-    {GL_STATE_CLIENT_ARRAY, GL_TEXTURE_COORD_ARRAY, false, {}},            // 12
-    {GL_STATE_CLIENT_ARRAY, GL_VERTEX_ARRAY, false, {}},                   // 13
-    {GL_STATE_CLIENT_ARRAY, GL_COLOR_ARRAY, false, {}},                    // 14
-    {GL_STATE_ENABLE, GL_CULL_FACE, true, {GL_TRUE}},                      // 15
-    {GL_STATE_CULL_FACE_MODE, 0, true, {GL_BACK}},                         // 16
-    {GL_STATE_FRONT_FACE, 0, true, {GL_CCW}},                              // 17
-    {GL_STATE_VERTEX_POINTER, 0, false, {}},                               // 18
-    {GL_STATE_TEXCOORD_POINTER, 0, false, {}},                             // 19
+// Positions in COMPOSE_SAVED, then COMPOSE_ALPHA_SAVED, which is saved after it.
+enum ComposeSaved : uint8_t {
+    COMPOSE_SAVED_COLOR_MASK,
+    COMPOSE_SAVED_DEPTH_MASK,
+    COMPOSE_SAVED_MATRIX_MODE,
+    COMPOSE_SAVED_BLEND_FUNC,
+    COMPOSE_SAVED_VIEWPORT,
+    COMPOSE_SAVED_BLEND,
+    COMPOSE_SAVED_DEPTH_TEST,
+    COMPOSE_SAVED_TEXTURE_2D,
+    COMPOSE_SAVED_LIGHTING,
+    COMPOSE_SAVED_TEXTURE_BINDING,
+    COMPOSE_SAVED_TEX_ENV_MODE,
+    COMPOSE_SAVED_ARRAY_BUFFER,
+    COMPOSE_SAVED_TEXTURE_COORD_ARRAY,
+    COMPOSE_SAVED_VERTEX_ARRAY,
+    COMPOSE_SAVED_COLOR_ARRAY,
+    COMPOSE_SAVED_CULL_FACE,
+    COMPOSE_SAVED_CULL_FACE_MODE,
+    COMPOSE_SAVED_FRONT_FACE,
+    COMPOSE_SAVED_VERTEX_POINTER,
+    COMPOSE_SAVED_TEXCOORD_POINTER,
+    COMPOSE_SAVED_FIRST_COUNT,
+    COMPOSE_SAVED_ALPHA_TEST = COMPOSE_SAVED_FIRST_COUNT,
+    COMPOSE_SAVED_ALPHA_FUNC,
+    COMPOSE_SAVED_COUNT
 };
+
+// What is saved before the quads, in query order; some items are set right after saving.
+constexpr GlStateItem COMPOSE_SAVED[] = {
+    {GL_STATE_COLOR_MASK, 0, true, {GL_TRUE, GL_TRUE, GL_TRUE, GL_TRUE}},
+    {GL_STATE_DEPTH_MASK, 0, true, {GL_FALSE}},
+    {GL_STATE_MATRIX_MODE, 0, false, {}},
+    {GL_STATE_BLEND_FUNC, 0, false, {}},
+    {GL_STATE_VIEWPORT, 0, false, {}},
+    {GL_STATE_ENABLE, GL_BLEND, false, {}},
+    {GL_STATE_ENABLE, GL_DEPTH_TEST, false, {}},
+    {GL_STATE_ENABLE, GL_TEXTURE_2D, false, {}},
+    {GL_STATE_ENABLE, GL_LIGHTING, false, {}},
+    {GL_STATE_TEXTURE_BINDING, 0, false, {}},
+    {GL_STATE_TEX_ENV_MODE, 0, false, {}},
+    {GL_STATE_ARRAY_BUFFER, 0, false, {}},
+    {GL_STATE_CLIENT_ARRAY, GL_TEXTURE_COORD_ARRAY, false, {}},
+    {GL_STATE_CLIENT_ARRAY, GL_VERTEX_ARRAY, false, {}},
+    {GL_STATE_CLIENT_ARRAY, GL_COLOR_ARRAY, false, {}},
+    {GL_STATE_ENABLE, GL_CULL_FACE, true, {GL_TRUE}},
+    {GL_STATE_CULL_FACE_MODE, 0, true, {GL_BACK}},
+    {GL_STATE_FRONT_FACE, 0, true, {GL_CCW}},
+    {GL_STATE_VERTEX_POINTER, 0, false, {}},
+    {GL_STATE_TEXCOORD_POINTER, 0, false, {}},
+};
+static_assert(std::size(COMPOSE_SAVED) == COMPOSE_SAVED_FIRST_COUNT, "one position per item");
 
 // Saved once the texture is set up, just before the alpha test is switched off.
-const GlStateItem COMPOSE_ALPHA_SAVED[] = {
-    {GL_STATE_ENABLE, GL_ALPHA_TEST, false, {}},  // 20
-    {GL_STATE_ALPHA_FUNC, 0, false, {}},          // 21
+constexpr GlStateItem COMPOSE_ALPHA_SAVED[] = {
+    {GL_STATE_ENABLE, GL_ALPHA_TEST, false, {}},
+    {GL_STATE_ALPHA_FUNC, 0, false, {}},
 };
+static_assert(std::size(COMPOSE_SAVED) + std::size(COMPOSE_ALPHA_SAVED) == COMPOSE_SAVED_COUNT,
+              "one position per item");
 
 // The order things are put back in; the scissor box and the framebuffer stay as drawn.
-const uint8_t COMPOSE_RESTORE_ORDER[] = {20, 21, 5, 6, 7, 8, 2, 4, 3, 9, 10, 11,
-                                         12, 13, 14, 15, 16, 17, 18, 19, 1, 0};
+constexpr uint8_t COMPOSE_RESTORE_ORDER[] = {
+    COMPOSE_SAVED_ALPHA_TEST,          COMPOSE_SAVED_ALPHA_FUNC,      COMPOSE_SAVED_BLEND,
+    COMPOSE_SAVED_DEPTH_TEST,          COMPOSE_SAVED_TEXTURE_2D,      COMPOSE_SAVED_LIGHTING,
+    COMPOSE_SAVED_MATRIX_MODE,         COMPOSE_SAVED_VIEWPORT,        COMPOSE_SAVED_BLEND_FUNC,
+    COMPOSE_SAVED_TEXTURE_BINDING,     COMPOSE_SAVED_TEX_ENV_MODE,    COMPOSE_SAVED_ARRAY_BUFFER,
+    COMPOSE_SAVED_TEXTURE_COORD_ARRAY, COMPOSE_SAVED_VERTEX_ARRAY,    COMPOSE_SAVED_COLOR_ARRAY,
+    COMPOSE_SAVED_CULL_FACE,           COMPOSE_SAVED_CULL_FACE_MODE,  COMPOSE_SAVED_FRONT_FACE,
+    COMPOSE_SAVED_VERTEX_POINTER,      COMPOSE_SAVED_TEXCOORD_POINTER, COMPOSE_SAVED_DEPTH_MASK,
+    COMPOSE_SAVED_COLOR_MASK,
+};
+static_assert(std::size(COMPOSE_RESTORE_ORDER) == COMPOSE_SAVED_COUNT, "everything saved is put back");
 
 void PushIdentity(GLenum mode) {
     raw::glMatrixMode(mode);
@@ -62,7 +104,7 @@ void OverlayTarget::Compose(const ComposeQuad* quads, int32_t quad_count, float 
     Unbind();
 
     GlStateSnapshot saved;
-    saved.Save(COMPOSE_SAVED, sizeof(COMPOSE_SAVED) / sizeof(COMPOSE_SAVED[0]));
+    saved.Save(COMPOSE_SAVED, std::size(COMPOSE_SAVED));
 
     // y grows downward, so the overlay comes out upright.
     PushIdentity(GL_PROJECTION);
@@ -83,7 +125,7 @@ void OverlayTarget::Compose(const ComposeQuad* quads, int32_t quad_count, float 
     // The overlay holds premultiplied colour: it was drawn with alpha blending onto (0,0,0,0).
     raw::glBlendFunc(GL_ONE, GL_ONE_MINUS_SRC_ALPHA);
 
-    saved.Save(COMPOSE_ALPHA_SAVED, sizeof(COMPOSE_ALPHA_SAVED) / sizeof(COMPOSE_ALPHA_SAVED[0]));
+    saved.Save(COMPOSE_ALPHA_SAVED, std::size(COMPOSE_ALPHA_SAVED));
     raw::glDisable(GL_ALPHA_TEST);
     raw::glAlphaFunc(GL_NOTEQUAL, 0.0f);
     raw::glDisable(GL_LIGHTING);
@@ -111,7 +153,7 @@ void OverlayTarget::Compose(const ComposeQuad* quads, int32_t quad_count, float 
     PopMatrix(GL_PROJECTION);
     PopMatrix(GL_TEXTURE);
     PopMatrix(GL_MODELVIEW);
-    saved.Restore(COMPOSE_RESTORE_ORDER, sizeof(COMPOSE_RESTORE_ORDER));
+    saved.Restore(COMPOSE_RESTORE_ORDER, std::size(COMPOSE_RESTORE_ORDER));
 }
 
 }  // namespace ovo

@@ -38,9 +38,11 @@ TEST(DebugConfig, WritesTheLogOnlyWhenSwitchedOn) {
         {Configuration("a=\"b\" " + on, "true"), LOG_PATH},
         {Configuration(on, "true", "<output/>"), FALLBACK_PATH},
         {"", nullptr},
+        {"<?xml version=\"1.0\"?>", nullptr},  // no element at all
         {Configuration("version=\"1.1\"", "true"), nullptr},
         {Configuration(on, "TRUE"), nullptr},
         {"<other " + on + "/>" + Configuration(on, "true"), nullptr},  // duoscope must come first
+        {"<debug " + on + "/>" + Configuration(on, "true"), nullptr},
         {"<a/> / " + Configuration(on, "true"), nullptr},
     };
     for (const auto& test : cases) {

@@ -59,7 +59,7 @@ TEST(XmlReader, BuildsTheTreeThatTheFileDescribes) {
         {"<a x=\"", "{a[x=]}"},
         {"<a/> / <b/>", NO_DOCUMENT},
         {"<!DOCTYPE a><a/>", NO_DOCUMENT},
-        {"<? / ?><a/>", "{a}"},  // errors inside a declaration are ignored
+        {"<?x / ?><a/>", "{a}"},  // errors inside a declaration are ignored
         // The token buffer holds 1023 characters; long text is cut, not fatal.
         {"<" + fits + " x=\"" + fits + "\"/>", "{" + fits + "[x=" + fits + "]}"},
         {"<" + too_long + "/><a x=\"" + too_long + "\"/><b/>", "{b}"},
@@ -101,7 +101,7 @@ TEST(XmlReader, KeepsEveryEntryOfLongLists) {
 TEST(XmlQuery, ResolvesPaths) {
     const std::string segment63(63, 's'), long_value(300, 'v');
     std::unique_ptr<XmlElement> document = Parse(
-        "<duoscope><debug enable=\"true\"><output filename=\"/x.log\"/></debug></duoscope>"
+        "<duoscope><debris/><debug enabled=\"no\" enable=\"true\"><output filename=\"/x.log\"/></debug></duoscope>"
         "<a x=\"outer\"><a x=\"inner\"/><b x=\"first\"/><b x=\"second\"/></a>"
         "<c:d e:f=\"colon\"/><" + segment63 + " v=\"" + long_value + "\"/>");
     ASSERT_NE(document, nullptr);

@@ -259,12 +259,24 @@ TEST_F(StereoProfileTest, TheProcessNameDecidesTheModeAndThePreset) {
 }
 
 TEST(ProcessNamesTest, NamesAreComparedExactly) {
+    for (const char* name : {"com.rovio.angrybirdsrio.korean", "com.rovio.angrybirds", "com.rovio.angrybirds_lite",
+                             "com.rovio.angrybirdsseasons", "com.Paladog.Lite", "com.rovio.angrybirdsrio",
+                             "com.rovio.angrybirdsstarwars.ads.iap"})
+        EXPECT_TRUE(ovo::IsListedProcess(name)) << name;
+    const std::pair<const char*, int> wallpapers[] = {
+        {"fishnoodle.snowfall_free", 1}, {"fishnoodle.snowfall", 1},  {"com.android.wallpaper", 2},
+        {"fishnoodle.koipond_free", 3},  {"fishnoodle.koipond", 3},   {"fishnoodle.aquarium_free", 4},
+        {"fishnoodle.aquarium", 4},      {"fishnoodle.clouds_free", 5}, {"fishnoodle.clouds", 5},
+        {"au.com.dealsmap.lwp.cube.PackEarth", 6}};
+    for (auto [name, kind] : wallpapers) {
+        EXPECT_EQ(ovo::LiveWallpaperKindOf(name), kind) << name;
+        EXPECT_TRUE(ovo::IsLiveWallpaperNamePrefix(name)) << name;
+        EXPECT_FALSE(ovo::IsListedProcess(name)) << name;
+    }
     for (const char* name : {"com.rovio.angrybirdsstarwars", "com.paladog.lite", "com.Paladog", "com.Paladog.Lite2"})
         EXPECT_FALSE(ovo::IsListedProcess(name)) << name;
-    const std::pair<const char*, int> cases[] = {{"fishnoodle.snowfall_free", 1}, {"fishnoodle.koipond", 3},
-                                                 {"au.com.dealsmap.lwp.cube.PackEarth", 6},
-                                                 {"com.android.wallpaper.livepicker", 0}, {"fishnoodle.snowfal", 0},
-                                                 {nullptr, 0}};
+    const std::pair<const char*, int> cases[] = {{"com.android.wallpaper.livepicker", 0}, {"fishnoodle.snowfal", 0},
+                                                 {"Fishnoodle.clouds", 0}, {nullptr, 0}};
     for (auto [name, kind] : cases) EXPECT_EQ(ovo::LiveWallpaperKindOf(name), kind) << (name ? name : "null");
     // What a name cut at the end of the argument area may still grow into.
     const std::pair<const char*, bool> prefixes[] = {{"com", true}, {"com.android.wallpaper", true},

@@ -1,10 +1,12 @@
-// The column mask on Mesa, reached through the library: the pixel columns it marks and the
-// application state it leaves alone, in both drawing paths.
+// The library's own drawing on Mesa, reached through the library: the pixel columns the
+// column mask marks, and the application state that the mask (in both drawing paths) and
+// the overlay's composition leave alone.
 #include <GLES/gl.h>
 #include <GLES/glext.h>
 #include <GLES2/gl2.h>
 #include <gtest/gtest.h>
 
+#include <algorithm>
 #include <cstdint>
 #include <iterator>
 #include <ostream>
@@ -14,6 +16,8 @@
 
 #include "core/stereo_manager.h"
 #include "present/composition_renderer.h"
+#include "stereo/draw_call.h"
+#include "stereo/overlay_target.h"
 #include "support/mesa_context.h"
 
 namespace {
@@ -241,15 +245,28 @@ void SetGl1ApplicationState() {
 
 class StateOnMesa : public CompositionOnMesa {
 protected:
-    // Present with the application's state set, then every probe reads what it read before.
-    void ExpectStateKept(const Probe* own, size_t own_count) {
+    // `own` and the shared probes, but for `left_as_drawn`.
+    static std::vector<Probe> Probes(const Probe* own, size_t own_count, GLenum left_as_drawn = GL_NONE) {
         std::vector<Probe> probes(own, own + own_count);
         probes.insert(probes.end(), std::begin(SHARED_PROBES), std::end(SHARED_PROBES));
+        probes.erase(std::remove_if(probes.begin(), probes.end(),
+                                    [&](const Probe& probe) { return probe.m_name == left_as_drawn; }),
+                     probes.end());
+        return probes;
+    }
+
+    // `draw` with the application's state set; then every probe reads what it read before.
+    template <typename Draw>
+    static void ExpectStateKept(const std::vector<Probe>& probes, Draw draw) {
         std::vector<std::vector<double>> before;
         for (const Probe& probe : probes) before.push_back(probe.Read());
-        Present();
+        draw();
         for (size_t i = 0; i < probes.size(); ++i)
             EXPECT_EQ(probes[i].Read(), before[i]) << probes[i].m_label;
+    }
+
+    void ExpectPresentKeepsState(const Probe* own, size_t own_count) {
+        ExpectStateKept(Probes(own, own_count), [this] { Present(); });
         ExpectMaskOn(1);  // and the mask was really drawn, where MaskColumnsOnMesa finds it
     }
 };
@@ -258,7 +275,64 @@ TEST_F(StateOnMesa, TheGl1PathLeavesTheApplicationsStateAsItWas) {
     Open(PATH_GL1, 64, 32);
     SetSharedApplicationState();
     SetGl1ApplicationState();
-    ExpectStateKept(GL1_PROBES, std::size(GL1_PROBES));
+    ExpectPresentKeepsState(GL1_PROBES, std::size(GL1_PROBES));
+}
+
+// The overlay, red on its left half and green on its right, composed once over the window
+// and into both halves with an eye shift of 8 pixels: each eye's quad is 40 pixels wide, eye
+// 0's from the left edge of its half, eye 1's from 8 pixels left of it, so the colours meet
+// at column 20 of eye 0's half and column 12 of eye 1's. The application's state comes back,
+// but for the scissor box, which stays as drawn.
+TEST_F(StateOnMesa, TheOverlayCompositionPlacesEachEyeAndLeavesTheApplicationsState) {
+    Open(PATH_GL1, 64, 32);
+    ovo::StereoManager& manager = ovo::StereoManager::instance();
+    manager.m_profile->m_eye_shift = 8.0f / 400.0f;
+    ovo::OverlayTarget overlay(64, 32, ovo::OVERLAY_CREATE_OBJECTS);
+    overlay.Create();
+    const struct {
+        const char* m_label;
+        void (*m_compose)(ovo::OverlayTarget&);
+        int m_red_columns[2];  // in the window's left and right half; green in the rest
+    } cases[] = {
+        {"single", [](ovo::OverlayTarget& target) { target.ComposeSingle(0, 0, 64, 32, 0, 1); }, {32, 0}},
+        {"stereo",
+         [](ovo::OverlayTarget& target) { target.ComposeStereo(ovo::StereoManager::instance(), 0, 0, 32, 32, 0, 1); },
+         {20, 12}},
+    };
+    for (const auto& each : cases) {
+        SCOPED_TRACE(each.m_label);
+        manager.m_viewport = manager.m_scissor = {0, 0, 64, 32};
+        glColorMask(GL_TRUE, GL_TRUE, GL_TRUE, GL_TRUE);
+        overlay.DrawInto(manager, ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 0));  // bound, holds content
+        glEnable(GL_SCISSOR_TEST);
+        for (const auto& [x, green] : {std::pair{0, 0.0f}, std::pair{32, 1.0f}}) {
+            glScissor(x, 0, 32, 32);
+            glClearColor(1 - green, green, 0, 1);
+            glClear(GL_COLOR_BUFFER_BIT);
+        }
+        overlay.Unbind();
+        glDisable(GL_SCISSOR_TEST);
+        glClearColor(0, 0, 1, 1);
+        glClear(GL_COLOR_BUFFER_BIT);
+        SetSharedApplicationState();
+        SetGl1ApplicationState();
+        ExpectStateKept(Probes(GL1_PROBES, std::size(GL1_PROBES), GL_SCISSOR_BOX), [&] { each.m_compose(overlay); });
+        std::vector<GLubyte> pixels(64 * 32 * 4);
+        glReadPixels(0, 0, 64, 32, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
+        for (int half = 0; half < 2; ++half) {
+            int red = 0;
+            int green = 0;
+            for (int y = 0; y < 32; ++y) {
+                for (int x = 32 * half; x < 32 * half + 32; ++x) {
+                    const GLubyte* pixel = &pixels[(static_cast<size_t>(y) * 64 + x) * 4];
+                    red += pixel[0] > 200 && pixel[1] < 50 && pixel[2] < 50;
+                    green += pixel[1] > 200 && pixel[0] < 50 && pixel[2] < 50;
+                }
+            }
+            EXPECT_EQ(red, each.m_red_columns[half] * 32) << "half " << half;
+            EXPECT_EQ(green, (32 - each.m_red_columns[half]) * 32) << "half " << half;
+        }
+    }
 }
 
 // Attribute 0 as an application leaves it, unlike the mask's and GL's defaults.
@@ -296,7 +370,7 @@ TEST_F(StateOnMesa, TheGl2PathLeavesTheApplicationsStateAsItWas) {
         SetSharedApplicationState();
         glUseProgram(FillProgram());
         SetAttribute0(each);
-        ExpectStateKept(GL2_PROBES, std::size(GL2_PROBES));
+        ExpectPresentKeepsState(GL2_PROBES, std::size(GL2_PROBES));
     }
 }
 

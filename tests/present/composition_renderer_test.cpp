@@ -12,6 +12,7 @@
 #include <vector>
 
 #include "core/stereo_manager.h"
+#include "egl/context_registry.h"
 #include "stereo/es1_stereo_layer.h"
 #include "stereo/es2_stereo_layer.h"
 #include "support/device_files.h"
@@ -104,6 +105,13 @@ const LineCase LINE_CASES[] = {
     {"Gl2_1280x720", PATH_GL2, 1280, 720, 641, {0, 0, 0, 720}, {1280, 0, 1280, 720}},
     {"Gl1_1280x720", PATH_GL1, 1280, 720, 641, {-640, 360, -640, -360}, {640, 360, 640, -360}},
     {"Gl1_480x800", PATH_GL1, 480, 800, 241, {-240, 400, -240, -400}, {240, 400, 240, -400}},
+    // Every other known size, once in one path.
+    {"Gl2_800x480", PATH_GL2, 800, 480, 401, {0, 0, 0, 480}, {800, 0, 800, 480}},
+    {"Gl1_800x1280", PATH_GL1, 800, 1280, 401, {-400, 640, -400, -640}, {400, 640, 400, -640}},
+    {"Gl2_960x540", PATH_GL2, 960, 540, 481, {0, 0, 0, 540}, {960, 0, 960, 540}},
+    {"Gl1_540x960", PATH_GL1, 540, 960, 271, {-270, 480, -270, -480}, {270, 480, 270, -480}},
+    {"Gl2_1280x800", PATH_GL2, 1280, 800, 641, {0, 0, 0, 800}, {1280, 0, 1280, 800}},
+    {"Gl1_720x1280", PATH_GL1, 720, 1280, 361, {-360, 640, -360, -640}, {360, 640, 360, -640}},
     {"Gl2_1024x600", PATH_GL2, 1024, 600, 401, GL2_FALLBACK_FIRST, GL2_FALLBACK_LAST},
     {"Gl1_1024x600", PATH_GL1, 1024, 600, 401, GL1_FALLBACK_FIRST, GL1_FALLBACK_LAST},
     {"Gl2_0x0", PATH_GL2, 0, 0, 401, GL2_FALLBACK_FIRST, GL2_FALLBACK_LAST},
@@ -535,6 +543,23 @@ TEST_F(NewSurfaceMaskTest, NothingIsMaskedWhileTheApplicationsFramebufferIsBound
     AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING, {0});
     ExpectCalls(BeforeMaskTest(plain, NewSurfaceMask()), Draw());
     ExpectCalls(plain, Draw());
+}
+
+// A context that the registry cannot follow (past its capacity) has no share group to keep
+// the mask's program for: each frame makes its own and deletes it.
+TEST_F(CompositionRendererTest, AContextOfNoKnownGroupDeletesItsProgramEachFrame) {
+    Start(PATH_GL2, 800, 480);
+    EGLContext last = EGL_NO_CONTEXT;
+    for (size_t i = 0; i < ovo::CONTEXT_REGISTRY_CAPACITY; ++i) last = m_egl.CreateContext(2);
+    ASSERT_EQ(m_egl.MakeCurrent(last), EGL_TRUE);
+    ASSERT_EQ(Manager().m_contexts->ShareGroupOf(last), ovo::SHARE_GROUP_NONE);
+    AnswerResult(ovo::GL_ENTRY_glCreateProgram, 0, 7);
+    ResetRecorder();
+    m_renderer.Present(Manager());
+    m_renderer.Present(Manager());
+    const std::vector<std::string> calls = RecordedGlCalls();
+    EXPECT_EQ(std::count(calls.begin(), calls.end(), "glCreateProgram()"), 2);
+    EXPECT_EQ(std::count(calls.begin(), calls.end(), "glDeleteProgram(7)"), 2);
 }
 
 }  // namespace

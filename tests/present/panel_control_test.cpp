@@ -4,6 +4,9 @@
 #include <sys/ioctl.h>
 #include <unistd.h>
 
+#include <filesystem>
+#include <iterator>
+
 #include "support/device_files.h"
 
 namespace {
@@ -29,6 +32,19 @@ TEST(PanelControlTest, CompositionStartSendsOneAndMissingNodesAreSilent) {
     ovo::SendCompositionStart();
     EXPECT_FALSE(std::filesystem::exists(device_files::Path("/dev/zpx")));
     EXPECT_FALSE(std::filesystem::exists(device_files::Path("/dev/zdriver")));
+}
+
+size_t OpenDescriptors() {
+    return static_cast<size_t>(std::distance(std::filesystem::directory_iterator("/proc/self/fd"),
+                                             std::filesystem::directory_iterator()));
+}
+
+// The panel is asked again about ten times a second for as long as the game runs.
+TEST(PanelControlTest, EveryPanelRequestClosesItsNode) {
+    device_files::Write("/dev/zpx", "");
+    const size_t before = OpenDescriptors();
+    for (int request = 0; request < 50; ++request) ASSERT_TRUE(ovo::SetPanelMode(true, request % 2 == 0));
+    EXPECT_EQ(OpenDescriptors(), before);
 }
 
 // The stand-in answers only for its plain-file nodes; everything else reaches the real ioctl.

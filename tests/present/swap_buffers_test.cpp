@@ -6,7 +6,11 @@
 #include <string>
 
 #include "core/stereo_manager.h"
+#include "present/composition_renderer.h"
 #include "present/live_tuning.h"
+#include "stereo/draw_call.h"
+#include "stereo/overlay_target.h"
+#include "support/recorded_calls.h"
 #include "support/device_files.h"
 #include "support/egl_session.h"
 #include "support/forwarding_check.h"
@@ -99,6 +103,38 @@ TEST_F(SwapBuffersTest, AFailedVendorSwapIsReportedAndTheRefreshStillRuns) {
     EXPECT_EQ(Swap(), (RecorderResult<EGLBoolean>(RECORDER_API_EGL, ovo::EGL_ENTRY_eglSwapBuffers)));
 }
 
+// The overlay collected during the frame goes into it before the vendor's swap; after the
+// swap the overlay is emptied and the next frame's mask drawn.
+TEST_F(SwapBuffersTest, TheOverlayGoesIntoTheFrameBeforeTheSwapAndTheMaskAfter) {
+    ovo::StereoManager& manager = ovo::StereoManager::instance();
+    ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(1)), EGL_TRUE);
+    Profile().m_eye_target = true;
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
+    manager.m_overlay->Create();
+    manager.m_overlay->DrawInto(manager, ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 3));
+    manager.m_composer = new ovo::CompositionRenderer(1);  // released at exit
+    manager.m_interleave = true;
+    ResetRecorder();
+    Swap();
+    std::vector<std::string> order;
+    for (const std::string& call : recorded_calls::RecordedCalls(true)) {
+        if (call == "glDrawArrays(5, 0, 4)" || call.compare(0, 15, "eglSwapBuffers(") == 0 ||
+            call == "glClear(0x4100)" || call == "glClearStencil(1)")
+            order.push_back(call.substr(0, call.find('(')));
+    }
+    EXPECT_EQ(order, (std::vector<std::string>{"glDrawArrays", "glDrawArrays", "eglSwapBuffers", "glClear",
+                                               "glClearStencil"}));
+    EXPECT_FALSE(manager.m_overlay->HasContent());
+}
+
+// Leaves a non-zero pattern where the next call's locals will lie, so that a value the
+// reader uses before it set it shows.
+__attribute__((noinline)) void DirtyTheStack() {
+    volatile float junk[4096];
+    for (size_t i = 0; i < 4096; ++i) junk[i] = 9.0f;
+    static_cast<void>(junk[0]);
+}
+
 TEST_F(SwapBuffersTest, TheLiveTuningFileSetsFourParameters) {
     struct Case {
         const char* m_text;
@@ -115,6 +151,7 @@ TEST_F(SwapBuffersTest, TheLiveTuningFileSetsFourParameters) {
     for (const Case& each : cases) {
         profile.m_eye_distance = profile.m_eye_angle = profile.m_eye_shift = profile.m_ramp_steps = 9.0f;
         device_files::Write("/sdcard/game_profile.txt", each.m_text);
+        DirtyTheStack();
         ovo::ReadLiveTuning(profile);
         const float got[4] = {profile.m_eye_distance, profile.m_eye_angle, profile.m_eye_shift,
                               profile.m_ramp_steps};

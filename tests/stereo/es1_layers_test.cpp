@@ -2,6 +2,8 @@
 #include <functional>
 #include <memory>
 
+#include "egl/current_context.h"
+#include "present/viewer_tracker.h"
 #include "stereo/es1_scaled_layer.h"
 #include "stereo/es1_sprite_stereo_layer.h"
 #include "stereo/es1_stereo_layer.h"
@@ -46,15 +48,15 @@ protected:
 TEST_F(Es1LayerTest, APerspectiveDrawMovesEachEyeAndItsImageBackThroughTheMask) {
     Interleave(true);
     AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
-    m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 6, 3);
     // Eye 0: T(-angle) P T(+distance); eye 1 negated. Eye 0 passes where the mask is 1.
     const Calls expected = Join(
         {MATRIX_QUERIES,
          {"glEnable(0x0B90)", "glMatrixMode(0x1701)", "glLoadIdentity()",
           "glTranslatef(-0.25, 0, 0)", "glMultMatrixf(ptr)", "glTranslatef(0.5, 0, 0)",
-          "glStencilFunc(0x0202, 1, 1)", "glDrawArrays(4, 0, 3)", "glMatrixMode(0x1701)",
+          "glStencilFunc(0x0202, 1, 1)", "glDrawArrays(4, 6, 3)", "glMatrixMode(0x1701)",
           "glLoadIdentity()", "glTranslatef(0.25, 0, 0)", "glMultMatrixf(ptr)",
-          "glTranslatef(-0.5, 0, 0)", "glStencilFunc(0x0202, 0, 1)", "glDrawArrays(4, 0, 3)",
+          "glTranslatef(-0.5, 0, 0)", "glStencilFunc(0x0202, 0, 1)", "glDrawArrays(4, 6, 3)",
           "glDisable(0x0B90)"},
          MATRIX_RESTORE});
     EXPECT_EQ(RecordedGlCalls(), expected);
@@ -124,18 +126,174 @@ TEST_F(Es1LayerTest, OnlyUnmovedDrawsWithOrdinaryBlendingGoToTheOverlay) {
     }
 }
 
+// The test is against the target's width: here the output (the screen) is wider.
 TEST_F(Es1LayerTest, AFullWidthViewportOffTheLeftEdgeKeepsTheProjection) {
     Interleave(false);
     AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
-    Manager().m_viewport = {5, 0, 800, 480};
-    m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-    EXPECT_EQ(Only({"glTranslatef", "glMultMatrixf", "glLoadIdentity"}), Calls());
-    EXPECT_EQ(Only({"glViewport"}), (Calls{"glViewport(2, 0, 400, 480)", "glViewport(402, 0, 400, 480)"}));
-
-    Manager().m_viewport = {0, 0, 800, 480};
+    Profile().m_width = 1280;
+    Profile().m_height = 720;
+    const struct {
+        ovo::GlRect m_viewport;
+        size_t m_translations;
+    } cases[] = {{{5, 0, 800, 480}, 0}, {{0, 0, 800, 480}, 4}, {{5, 0, 1280, 720}, 4}, {{5, 0, 799, 480}, 4}};
+    for (const auto& each : cases) {
+        Manager().m_viewport = each.m_viewport;
+        ResetRecorder();
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        EXPECT_EQ(Only({"glTranslatef"}).size(), each.m_translations)
+            << each.m_viewport.m_x << " " << each.m_viewport.m_width;
+    }
+    Manager().m_viewport = cases[0].m_viewport;
     ResetRecorder();
     m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-    EXPECT_EQ(Only({"glTranslatef"}).size(), 4u) << "at x = 0 the eyes are moved";
+    EXPECT_EQ(Only({"glViewport"}), (Calls{"glViewport(2, 0, 400, 480)", "glViewport(642, 0, 400, 480)"}));
+}
+
+// eye 0's and eye 1's translations: T(-angle) P T(+distance) for perspective draws, the shift
+// for flat ones, on the profile's axis.
+TEST_F(Es1LayerTest, TheEyeAndShiftAxesChooseWhereTheEyesMove) {
+    const struct {
+        bool m_perspective;
+        uint32_t m_axis;
+        Calls m_translations;
+    } cases[] = {
+        {true, ovo::STEREO_AXIS_Y,
+         {"glTranslatef(0, -0.25, 0)", "glTranslatef(0, 0.5, 0)", "glTranslatef(0, 0.25, 0)", "glTranslatef(0, -0.5, 0)"}},
+        {true, ovo::STEREO_AXIS_Z,
+         {"glTranslatef(0, 0, -0.25)", "glTranslatef(0, 0, 0.5)", "glTranslatef(0, 0, 0.25)", "glTranslatef(0, 0, -0.5)"}},
+        {true, 0x3999, Calls(4, "glTranslatef(0, 0, 0)")},
+        {false, ovo::STEREO_AXIS_Y, {"glTranslatef(0, 0.125, 0)", "glTranslatef(0, -0.125, 0)"}},
+        {false, ovo::STEREO_AXIS_Z, {"glTranslatef(0, 0, 0.125)", "glTranslatef(0, 0, -0.125)"}},
+        {false, 0x3999, Calls(2, "glTranslatef(0, 0, 0)")},
+    };
+    Interleave(true);
+    AnswerMatrix(GL_MODELVIEW_MATRIX, ORTHO);  // moved: no overlay candidate
+    for (const auto& each : cases) {
+        AnswerMatrix(GL_PROJECTION_MATRIX, each.m_perspective ? PERSPECTIVE : ORTHO);
+        Profile().m_eye_axis = each.m_perspective ? each.m_axis : ovo::STEREO_AXIS_X;
+        Profile().m_shift_axis = each.m_perspective ? ovo::STEREO_AXIS_X : each.m_axis;
+        ResetRecorder();
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        EXPECT_EQ(Only({"glTranslatef"}), each.m_translations) << std::hex << each.m_axis;
+    }
+}
+
+// Scaled as EyeViewportTest's rounding cases: each layer passes the manager's two factors.
+TEST_F(Es1LayerTest, EachLayerScalesTheEyesHalvesByTheOutputsFactors) {
+    ovo::Es1SpriteStereoLayer sprites;
+    Interleave(false);
+    Manager().m_scale_x = 1.5f;
+    Manager().m_scale_y = 1.25f;
+    Manager().m_viewport = {10, 20, 401, 243};
+    Manager().m_scissor = {4, 6, 101, 51};
+    AnswerMatrix(GL_MODELVIEW_MATRIX, ORTHO);
+    const Calls expected = {"glViewport(7, 25, 301, 303)", "glScissor(3, 7, 76, 63)",
+                            "glViewport(407, 25, 301, 303)", "glScissor(403, 7, 76, 63)"};
+    const struct {
+        ovo::GlLayer* m_layer;
+        const std::vector<GLfloat>* m_projection;
+    } cases[] = {{&m_stereo, &PERSPECTIVE}, {&m_stereo, &ORTHO}, {&sprites, &ORTHO}};
+    for (const auto& each : cases) {
+        AnswerMatrix(GL_PROJECTION_MATRIX, *each.m_projection);
+        ResetRecorder();
+        each.m_layer->glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        EXPECT_EQ(Only({"glViewport", "glScissor"}), expected) << &each - cases;
+    }
+}
+
+// Pending overlay content is composed after the mask test went on, then the eyes draw.
+TEST_F(Es1LayerTest, TheMaskTestIsOnBeforeThePendingOverlayIsComposed) {
+    Interleave(true);
+    CreateOverlay();
+    Blending(false, GL_ONE, GL_ZERO);
+    for (const std::vector<GLfloat>* projection : {&PERSPECTIVE, &ORTHO}) {
+        AnswerMatrix(GL_PROJECTION_MATRIX, ORTHO);
+        AnswerMatrix(GL_MODELVIEW_MATRIX, IDENTITY);
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);  // an overlay draw
+        AnswerMatrix(GL_PROJECTION_MATRIX, *projection);
+        AnswerMatrix(GL_MODELVIEW_MATRIX, ORTHO);
+        ResetRecorder();
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        Calls order;
+        for (const std::string& call : RecordedGlCalls()) {
+            if (call == "glEnable(0x0B90)" || call.compare(0, 13, "glDrawArrays(") == 0) order.push_back(call);
+        }
+        EXPECT_EQ(order, (Calls{"glEnable(0x0B90)", "glDrawArrays(5, 0, 4)", "glDrawArrays(5, 0, 4)",
+                                "glDrawArrays(4, 0, 3)", "glDrawArrays(4, 0, 3)"}))
+            << (projection == &PERSPECTIVE ? "perspective" : "flat");
+    }
+}
+
+// A surface made current again after the first swap gets the mask at its first stereo
+// draw into it (before the pair), and only then; a clear of the stencil alone keeps its
+// colour.
+TEST_F(Es1LayerTest, ASurfaceMadeCurrentAgainIsMaskedAtItsFirstStereoDraw) {
+    Interleave(true);
+    AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
+    Manager().m_composer->Present(Manager());  // the first swap builds the lines
+    const EGLContext context = ovo::CurrentContext();
+    ASSERT_EQ(m_egl.MakeCurrent(EGL_NO_CONTEXT), EGL_TRUE);
+    ASSERT_EQ(m_egl.MakeCurrent(context), EGL_TRUE);
+    // Not while the application draws into its own framebuffer, which has no mask to hold.
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING_OES, {3});
+    ResetRecorder();
+    m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    EXPECT_EQ(Only({"glClear"}), Calls());
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_FRAMEBUFFER_BINDING_OES, {0});
+    for (const size_t masks : {1u, 0u}) {
+        ResetRecorder();
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        const Calls calls = Only({"glClear", "glDrawArrays"});
+        Calls expected(masks, "glClear(0x0400)");
+        if (masks != 0) expected.push_back("glDrawArrays(1, 0, 802)");
+        expected.insert(expected.end(), 2, "glDrawArrays(4, 0, 3)");
+        EXPECT_EQ(calls, expected);
+    }
+}
+
+// An off-centre glFrustumf(-1, 3, -1, 1, 1, 10) and an object 4 in front of the eye: its
+// origin lands at depth 2/3, which unprojects from the screen's centre to (4, 0, -4).
+TEST_F(Es1LayerTest, OnlyPerspectiveDrawsShowTheViewerTheNearestObject) {
+    const std::vector<GLfloat> off_centre = {0.5f, 0, 0, 0, 0, 1, 0, 0, 0.5f, 0, -11.0f / 9.0f, -1,
+                                             0, 0, -20.0f / 9.0f, 0};
+    const std::vector<GLfloat> four_ahead = {1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 0, 0, -4, 1};
+    const struct {
+        const std::vector<GLfloat>* m_projection;
+        float m_distance;
+        float m_angle;
+    } cases[] = {{&off_centre, 4.0f, 45.0f}, {&ORTHO, 0.0f, 0.0f}};
+    Interleave(true);
+    AnswerMatrix(GL_MODELVIEW_MATRIX, four_ahead);
+    for (const auto& each : cases) {
+        delete Manager().m_viewer;
+        Manager().m_viewer = new ovo::ViewerTracker(true);
+        AnswerMatrix(GL_PROJECTION_MATRIX, *each.m_projection);
+        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        Manager().m_viewer->EstimateEyes();
+        EXPECT_NEAR(Manager().m_viewer->EyeDistance(), each.m_distance, 1e-5) << &each - cases;
+        EXPECT_NEAR(Manager().m_viewer->EyeAngle(), each.m_angle, 1e-4) << &each - cases;
+    }
+}
+
+// Eye 0's eye distance at three textures in a row: the ramp runs only while interleaving,
+// and in its OpenGL ES 1.x form (which ramps the shift for the z selector).
+TEST_F(Es1LayerTest, TheRampMovesInterleavedDrawsAtEachNewTexture) {
+    const RampCase cases[] = {
+        {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_X,
+         {"glTranslatef(-0.04, 0, 0)", "glTranslatef(-0.03, 0, 0)", "glTranslatef(-0.02, 0, 0)"}},
+        {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_Z, Calls(3, "glTranslatef(-0.04, 0, 0)")},
+        {ovo::STEREO_RAMP_ON, false, ovo::STEREO_AXIS_X, Calls(3, "glTranslatef(0.5, 0, 0)")},
+        {ovo::STEREO_RAMP_OFF, true, ovo::STEREO_AXIS_X, Calls(3, "glTranslatef(0.5, 0, 0)")},
+    };
+    AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
+    Profile().m_eye_distance_set = -0.04f;
+    Profile().m_ramp_steps = 4.0f;
+    for (const RampCase& each : cases) {
+        Profile().m_eye_distance = 0.5f;
+        const Calls seen =
+            AtThreeTextures(each, [&] { m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3); }, "glTranslatef", 1);
+        EXPECT_EQ(seen, each.m_seen) << std::hex << each.m_ramp << " " << each.m_param;
+    }
 }
 
 TEST_F(Es1LayerTest, SpriteDrawsSitOnTheirTexturesDepthPlane) {
@@ -187,17 +345,64 @@ TEST_F(Es1LayerTest, ThePlainModeDrawsOnceWithTheScaledViewport) {
     EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
-TEST_F(Es1LayerTest, ClearsReachTheWindowEvenWhileTheOverlayIsBound) {
+// Clears cover the output (here the screen, wider than the target), on the window; the
+// plain mode's clear simply goes where the application's framebuffer is bound.
+TEST_F(Es1LayerTest, ClearsCoverTheOutputAndReachTheWindowEvenWhileTheOverlayIsBound) {
+    ovo::Es1SpriteStereoLayer sprites;
+    ovo::Es1ScaledLayer scaled;
     CreateOverlay();
     Interleave(false);
-    m_stereo.glClear(Manager(), GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT);
-    EXPECT_EQ(RecordedGlCalls(), (Calls{"glScissor(0, 0, 800, 480)", "glClear(0x4100)"}));
+    Profile().m_width = 1280;
+    Profile().m_height = 720;
+    const struct {
+        ovo::GlLayer* m_layer;
+        bool m_to_window;
+    } cases[] = {{&m_stereo, true}, {&sprites, true}, {&scaled, false}};
+    for (const auto& each : cases) {
+        Manager().m_overlay->SetBoundFramebuffer(0);
+        ResetRecorder();
+        each.m_layer->glClear(Manager(), GL_COLOR_BUFFER_BIT | GL_DEPTH_BUFFER_BIT);
+        EXPECT_EQ(RecordedGlCalls(), (Calls{"glScissor(0, 0, 1280, 720)", "glClear(0x4100)"})) << &each - cases;
 
+        Manager().m_overlay->Bind();
+        ResetRecorder();
+        each.m_layer->glClear(Manager(), GL_COLOR_BUFFER_BIT);
+        const Calls expected =
+            each.m_to_window ? Calls{"glScissor(0, 0, 1280, 720)", "glBindFramebufferOES(0x8D40, 0)",
+                                     "glClear(0x4000)", "glBindFramebufferOES(0x8D40, 7)"}
+                             : Calls{"glScissor(0, 0, 1280, 720)", "glClear(0x4000)"};
+        EXPECT_EQ(RecordedGlCalls(), expected) << &each - cases;
+    }
+}
+
+// Before a draw that is no overlay draw, the plain mode composes what the overlay holds as
+// one 1280 x 720 quad, then empties the overlay and leaves it unbound.
+TEST_F(Es1LayerTest, ThePlainModeComposesPendingOverlayOnceBeforeADraw) {
+    ovo::Es1ScaledLayer scaled;
+    Interleave(false);
+    CreateOverlay();
+    Blending(false, GL_ONE, GL_ZERO);
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VIEWPORT, {1, 2, 3, 4});
+    AnswerMatrix(GL_PROJECTION_MATRIX, ORTHO);
+    scaled.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);  // an overlay draw
+    AnswerMatrix(GL_MODELVIEW_MATRIX, ORTHO);
+    ResetRecorder();
+    scaled.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    const Calls expected = {
+        "glBindFramebufferOES(0x8D40, 0)", "glOrthof(0, 1280, 720, 0, -1, 1)",
+        "glViewport(0, 0, 1280, 720)", "glDrawArrays(5, 0, 4)", "glViewport(1, 2, 3, 4)",
+        // emptied: bound, cleared, the window's binding back
+        "glBindFramebufferOES(0x8D40, 7)", "glViewport(0, 0, 800, 480)", "glClear(0x4100)",
+        "glBindFramebufferOES(0x8D40, 0)", "glViewport(0, 0, 800, 480)", "glDrawArrays(4, 0, 3)"};
+    EXPECT_EQ(Only({"glBindFramebufferOES", "glOrthof", "glViewport", "glDrawArrays", "glClear"}), expected);
+    EXPECT_FALSE(Manager().m_overlay->HasContent());
+    EXPECT_EQ(Manager().m_overlay->BoundFramebuffer(), 0u);
+    // Bound without content, the overlay is still unbound before the draw.
     Manager().m_overlay->Bind();
     ResetRecorder();
-    m_stereo.glClear(Manager(), GL_COLOR_BUFFER_BIT);
-    EXPECT_EQ(RecordedGlCalls(), (Calls{"glScissor(0, 0, 800, 480)", "glBindFramebufferOES(0x8D40, 0)",
-                                        "glClear(0x4000)", "glBindFramebufferOES(0x8D40, 7)"}));
+    scaled.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    EXPECT_EQ(Only({"glBindFramebufferOES", "glDrawArrays"}),
+              (Calls{"glBindFramebufferOES(0x8D40, 0)", "glDrawArrays(4, 0, 3)"}));
 }
 
 TEST_F(Es1LayerTest, EachModeHasItsLayer) {

@@ -99,6 +99,10 @@ TEST_F(Es2LayerTest, AWindowDrawSetsEachEyesUniformThroughTheMask) {
     EXPECT_EQ(RecordedGlCalls(), expected);
     EXPECT_EQ(Manager().m_program, PROGRAM);
     EXPECT_EQ(Manager().m_depth_shift_location, LOCATION);
+    // The name the injected shaders declare.
+    const RecordedCall* lookup = FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glGetUniformLocation);
+    ASSERT_NE(lookup, nullptr);
+    EXPECT_STREQ(reinterpret_cast<const char*>(lookup->m_arguments[1]), "uZpDepthShift");
 }
 
 TEST_F(Es2LayerTest, WithoutInterleavingEachEyeDrawsIntoItsHalf) {
@@ -112,6 +116,60 @@ TEST_F(Es2LayerTest, WithoutInterleavingEachEyeDrawsIntoItsHalf) {
         "glViewport(0, 0, 800, 240)", "glScissor(0, 0, 800, 240)",
         "glDrawElements(4, 6, 0x1403, null)"};
     EXPECT_EQ(RecordedGlCalls(), expected);
+}
+
+// Eye 0's (angle, distance) at three textures in a row: the ramp runs only while
+// interleaving, in its OpenGL ES 2.0 form (the z selector ramps the distance).
+TEST_F(Es2LayerTest, TheDirectSubmodeRampsInterleavedDrawsAtEachNewTexture) {
+    const RampCase cases[] = {
+        {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_X,
+         {"glUniform2f(4, 0.25, -0.04)", "glUniform2f(4, 0.25, -0.03)", "glUniform2f(4, 0.25, -0.02)"}},
+        {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_Z,
+         {"glUniform2f(4, 0.25, -0.04)", "glUniform2f(4, 0.25, -0.03)", "glUniform2f(4, 0.25, -0.02)"}},
+        {ovo::STEREO_RAMP_ON, true, ovo::STEREO_AXIS_Y,
+         {"glUniform2f(4, 0.25, -0.04)", "glUniform2f(4, 0.1875, -0.04)", "glUniform2f(4, 0.125, -0.04)"}},
+        {ovo::STEREO_RAMP_ON, false, ovo::STEREO_AXIS_X, Calls(3, "glUniform2f(4, 0.5, 0.75)")},
+        {ovo::STEREO_RAMP_OFF, true, ovo::STEREO_AXIS_X, Calls(3, "glUniform2f(4, 0.5, 0.75)")},
+    };
+    Profile().m_eye_distance_set = -0.04f;
+    Profile().m_eye_angle_set = 0.25f;
+    Profile().m_ramp_steps = 4.0f;
+    for (const RampCase& each : cases) {
+        Profile().m_eye_angle = 0.5f;
+        Profile().m_eye_distance = 0.75f;
+        const Calls seen =
+            AtThreeTextures(each, [&] { m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3); }, "glUniform2f", 0);
+        EXPECT_EQ(seen, each.m_seen) << std::hex << each.m_ramp << " " << each.m_param;
+    }
+}
+
+// Scaled as EyeViewportTest's rounding cases, in each path that draws into the window.
+TEST_F(Es2LayerTest, EachWindowDrawScalesTheEyesHalvesByTheOutputsFactors) {
+    Interleave(false);
+    Manager().m_scale_x = 1.5f;
+    Manager().m_scale_y = 1.25f;
+    Manager().m_viewport = {10, 20, 401, 243};
+    Manager().m_scissor = {4, 6, 101, 51};
+    const Calls halves = {"glViewport(7, 25, 301, 303)", "glScissor(3, 7, 76, 63)",
+                          "glViewport(407, 25, 301, 303)", "glScissor(403, 7, 76, 63)"};
+    m_direct.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    EXPECT_EQ(Only({"glViewport", "glScissor"}), halves) << "direct";
+    ResetRecorder();
+    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    EXPECT_EQ(Only({"glViewport", "glScissor"}), halves) << "tracked";
+
+    // A render texture: the copies' viewport, the window's back, then the halves.
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
+    m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, 5);
+    m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGBA, 128, 64, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 3);
+    m_tracked.glFramebufferTexture2D(Manager(), GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, 5, 0);
+    m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 0);
+    ResetRecorder();
+    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    Calls expected = {"glViewport(0, 0, 128, 64)", "glViewport(10, 20, 401, 243)"};
+    expected.insert(expected.end(), halves.begin(), halves.end());
+    EXPECT_EQ(Only({"glViewport", "glScissor"}), expected) << "render texture";
 }
 
 TEST_F(Es2LayerTest, ADirectDrawIntoTheApplicationsFramebufferIsIssuedOnceUnchanged) {
@@ -292,17 +350,55 @@ TEST_F(TrackedLayerTest, UntrackedNamesAndUnsizedTexturesAreNeverRespecified) {
                                          GL_TEXTURE_2D, each.m_texture, 0);
         EXPECT_EQ(RecordedGlCalls().size(), 1u) << each.m_texture;
     }
+    // Deleted while bound: the next image goes to texture 0, not to the forgotten name.
+    const GLuint deleted = 9;
+    m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, deleted);
+    m_tracked.glDeleteTextures(Manager(), 1, &deleted);
+    m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGBA, 32, 32, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, deleted);
+    ResetRecorder();
+    m_tracked.glFramebufferTexture2D(Manager(), GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, deleted, 0);
+    EXPECT_EQ(RecordedGlCalls().size(), 1u) << "deleted";
+}
+
+TEST_F(TrackedLayerTest, WideningPutsBackTheTextureTheApplicationHasBound) {
+    m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, 5);
+    m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGB, 100, 50, 0, GL_RGB, GL_UNSIGNED_SHORT_5_6_5, nullptr);
+    m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, 8);
+    m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 3);
+    ResetRecorder();
+    m_tracked.glFramebufferTexture2D(Manager(), GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0, GL_TEXTURE_2D, 5, 0);
+    const Calls expected = {"glFramebufferTexture2D(0x8D40, 0x8CE0, 0x0DE1, 5, 0)", "glBindTexture(0x0DE1, 5)",
+                            "glTexImage2D(0x0DE1, 0, 6407, 200, 50, 0, 0x1907, 0x8363, null)",
+                            "glBindTexture(0x0DE1, 8)"};
+    EXPECT_EQ(RecordedGlCalls(), expected);
+}
+
+// A texture the application made and bound but never attached is an ordinary texture.
+TEST_F(TrackedLayerTest, AWindowDrawWithATextureNeverAttachedIsAPlainEyePair) {
+    Interleave(true);
+    m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, 6);
+    m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGBA, 128, 64, 0, GL_RGBA, GL_UNSIGNED_BYTE, nullptr);
+    ResetRecorder();
+    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    const Calls expected = {
+        "glGetIntegerv(0x8B8D, ptr)", "glGetUniformLocation(9, ptr)", "glEnable(0x0B90)",
+        "glUniform2f(4, 0.25, 0.5)", "glStencilFunc(0x0202, 1, 1)", "glDrawArrays(4, 0, 3)",
+        "glUniform2f(4, -0.25, -0.5)", "glStencilFunc(0x0202, 0, 1)", "glDrawArrays(4, 0, 3)",
+        "glDisable(0x0B90)"};
+    EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
 TEST_F(TrackedLayerTest, EachEyeDrawsIntoItsHalfOfTheApplicationsFramebuffer) {
     Interleave(true);
     MakeRenderTexture();
-    Manager().m_viewport = {0, 0, 128, 64};
+    // Narrower than the texture: eye 1 starts at the texture's own width.
+    Manager().m_viewport = {3, 0, 64, 32};
     ResetRecorder();
     m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
     const Calls expected = {
-        "glGetIntegerv(0x8B8D, ptr)", "glGetUniformLocation(9, ptr)", "glViewport(0, 0, 128, 64)",
-        "glUniform2f(4, 0.25, 0.5)", "glDrawArrays(4, 0, 3)", "glViewport(128, 0, 128, 64)",
+        "glGetIntegerv(0x8B8D, ptr)", "glGetUniformLocation(9, ptr)", "glViewport(3, 0, 64, 32)",
+        "glUniform2f(4, 0.25, 0.5)", "glDrawArrays(4, 0, 3)", "glViewport(131, 0, 64, 32)",
         "glUniform2f(4, -0.25, -0.5)", "glDrawArrays(4, 0, 3)"};
     EXPECT_EQ(RecordedGlCalls(), expected);
 }
@@ -338,6 +434,15 @@ TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
                     "glBindFramebuffer", "glDrawArrays", "glBindTexture", "glUniform2f",
                     "glStencilFunc"}),
               expected);
+    // Eye 0's copy samples the left half, eye 1's the right: the first texture coordinates.
+    std::vector<GLfloat> first_coordinates;
+    const RecorderState& state = *RecorderGetState();
+    for (uint32_t i = 0; i < state.m_call_count; ++i) {
+        const RecordedCall& call = state.m_calls[i];
+        if (call.m_index == ovo::GL_ENTRY_glVertexAttribPointer && call.m_arguments[0] == 1 && call.m_arguments[5] != 0)
+            first_coordinates.push_back(reinterpret_cast<const GLfloat*>(call.m_arguments[5])[0]);
+    }
+    EXPECT_EQ(first_coordinates, (std::vector<GLfloat>{0.0f, 0.5f}));
 }
 
 // The eye textures belong to the context that drew: made there once, used there again
@@ -369,10 +474,13 @@ TEST_F(TrackedLayerTest, EachContextKeepsItsOwnEyeTexturesUntilItEnds) {
     EXPECT_EQ(RecordedCalls(true), expected);
 }
 
+// Twice the output's width: here the screen, wider than the target.
 TEST_F(TrackedLayerTest, ClearsCoverTheDoubleWidth) {
+    Profile().m_width = 1280;
+    Profile().m_height = 720;
     m_tracked.glClear(Manager(), GL_COLOR_BUFFER_BIT);
     m_direct.glClear(Manager(), GL_DEPTH_BUFFER_BIT);
-    EXPECT_EQ(RecordedGlCalls(), Calls({"glScissor(0, 0, 1600, 480)", "glClear(0x4000)", "glClear(0x0100)"}));
+    EXPECT_EQ(RecordedGlCalls(), Calls({"glScissor(0, 0, 2560, 720)", "glClear(0x4000)", "glClear(0x0100)"}));
 }
 
 TEST_F(Es2LayerTest, TheScaledLayerScalesWindowDrawsAndClearsOnly) {
@@ -394,20 +502,111 @@ TEST_F(Es2LayerTest, TheScaledLayerScalesWindowDrawsAndClearsOnly) {
 }
 
 TEST_F(Es2LayerTest, TheStateGuardPutsBackOnlyWhatItSavedAndOnlyOnce) {
+    const void* offset = reinterpret_cast<const void*>(16);
     AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
+    BoundFramebuffer(6);
+    // Both attributes answer alike: the queries do not tell the index apart.
     for (auto [name, value] : {std::pair<GLenum, GLint>{GL_VERTEX_ATTRIB_ARRAY_ENABLED, 1},
                                {GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, 12}, {GL_VERTEX_ATTRIB_ARRAY_SIZE, 3},
-                               {GL_VERTEX_ATTRIB_ARRAY_TYPE, GL_FLOAT}, {GL_VERTEX_ATTRIB_ARRAY_STRIDE, 24}})
+                               {GL_VERTEX_ATTRIB_ARRAY_TYPE, GL_SHORT}, {GL_VERTEX_ATTRIB_ARRAY_NORMALIZED, 1},
+                               {GL_VERTEX_ATTRIB_ARRAY_STRIDE, 24}})
         AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv, name, {value});
-    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, 0);
-    ovo::GlStateGuard guard;
-    guard.Save(ovo::GUARD_TEXTURE | ovo::GUARD_ATTRIBUTE_1 | ovo::GUARD_DEPTH_TEST);
-    ResetRecorder();
-    guard.Restore();
-    guard.Restore();
-    const Calls expected = {"glBindTexture(0x0DE1, 5)", "glEnableVertexAttribArray(1)", "glBindBuffer(0x8892, 12)",
-                            "glVertexAttribPointer(1, 3, 0x1406, 0, 24, null)", "glDisable(0x0B71)"};
-    EXPECT_EQ(RecordedGlCalls(), expected);
+    AnswerBytes(ovo::GL_ENTRY_glGetVertexAttribPointerv, GL_VERTEX_ATTRIB_ARRAY_POINTER, &offset, sizeof(offset));
+    const struct {
+        uint32_t m_flags;
+        bool m_depth_test;
+        Calls m_restored;
+    } cases[] = {
+        {ovo::GUARD_TEXTURE | ovo::GUARD_ATTRIBUTE_1 | ovo::GUARD_DEPTH_TEST, false,
+         {"glBindTexture(0x0DE1, 5)", "glEnableVertexAttribArray(1)", "glBindBuffer(0x8892, 12)",
+          "glVertexAttribPointer(1, 3, 0x1402, 1, 24, ptr)", "glDisable(0x0B71)"}},
+        {ovo::GUARD_ALL, true,
+         {"glBindTexture(0x0DE1, 5)", "glUseProgram(9)", "glBindFramebuffer(0x8D40, 6)",
+          "glEnableVertexAttribArray(0)", "glBindBuffer(0x8892, 12)", "glVertexAttribPointer(0, 3, 0x1402, 1, 24, ptr)",
+          "glEnableVertexAttribArray(1)", "glBindBuffer(0x8892, 12)", "glVertexAttribPointer(1, 3, 0x1402, 1, 24, ptr)",
+          "glEnable(0x0B71)"}},
+    };
+    for (const auto& each : cases) {
+        AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DEPTH_TEST, each.m_depth_test);
+        ovo::GlStateGuard guard;
+        guard.Save(each.m_flags);
+        ResetRecorder();
+        guard.Restore();
+        guard.Restore();
+        EXPECT_EQ(RecordedGlCalls(), each.m_restored) << each.m_flags;
+        const RecordedCall* pointer = FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glVertexAttribPointer);
+        ASSERT_NE(pointer, nullptr);
+        EXPECT_EQ(pointer->m_arguments[5], ArgumentBits(offset)) << each.m_flags;
+    }
+}
+
+// Each eye's texture samples linearly, clamped, and is its framebuffer's colour; it gets
+// new storage whenever either side of the size changes, never for an empty size.
+TEST_F(Es2LayerTest, EyeTexturesSampleLinearlyAndFollowEverySizeChange) {
+    AnswerIntegers(ovo::GL_ENTRY_glGenTextures, 1, {21});
+    AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffers, 1, {22});
+    ovo::EyeTexturePair pair{};
+    pair.Create();
+    const Calls target = {"glBindTexture(0x0DE1, 21)", "glTexParameteri(0x0DE1, 0x2801, 9729)",
+                          "glTexParameteri(0x0DE1, 0x2800, 9729)", "glTexParameteri(0x0DE1, 0x2802, 33071)",
+                          "glTexParameteri(0x0DE1, 0x2803, 33071)", "glBindFramebuffer(0x8D40, 22)",
+                          "glFramebufferTexture2D(0x8D40, 0x8CE0, 0x0DE1, 21, 0)"};
+    Calls both = target;
+    both.insert(both.end(), target.begin(), target.end());
+    both.insert(both.end(), {"glBindTexture(0x0DE1, 0)", "glBindFramebuffer(0x8D40, 0)"});  // put back
+    EXPECT_EQ(Only({"glBindTexture", "glTexParameteri", "glBindFramebuffer", "glFramebufferTexture2D"}), both);
+
+    const struct {
+        GLuint m_width;
+        GLuint m_height;
+        bool m_storage;
+    } sizes[] = {{128, 64, true}, {128, 64, false}, {128, 32, true}, {64, 32, true},
+                 {0, 32, false},  {64, 32, true},   {64, 0, false}};
+    for (const auto& each : sizes) {
+        ResetRecorder();
+        pair.m_eyes[0].Resize(each.m_width, each.m_height);
+        const Calls expected =
+            each.m_storage ? Calls{"glTexImage2D(0x0DE1, 0, 6408, " + std::to_string(each.m_width) + ", " +
+                                   std::to_string(each.m_height) + ", 0, 0x1908, 0x1401, null)"}
+                           : Calls();
+        EXPECT_EQ(Only({"glTexImage2D"}), expected) << each.m_width << "x" << each.m_height;
+    }
+}
+
+// The copy's quad lives in client memory, so the array buffer is unbound before it is
+// pointed at; each half samples its own side of the render texture.
+TEST_F(Es2LayerTest, AHalfCopyDrawsItsSideFromClientMemory) {
+    AnswerIntegers(ovo::GL_ENTRY_glGetVertexAttribiv, GL_VERTEX_ATTRIB_ARRAY_BUFFER_BINDING, {12});
+    const ovo::EyeTexture eye = {21, 22, 128, 64, 23};
+    const struct {
+        void (ovo::EyeTexture::*m_copy)() const;
+        GLfloat m_coordinates[8];
+    } halves[] = {{&ovo::EyeTexture::CopyHalfLeft, {0, 1, 0, 0, 0.5f, 1, 0.5f, 0}},
+                  {&ovo::EyeTexture::CopyHalfRight, {0.5f, 1, 0.5f, 0, 1, 1, 1, 0}}};
+    for (const auto& half : halves) {
+        ResetRecorder();
+        (eye.*half.m_copy)();
+        const Calls expected = {"glDisable(0x0B71)", "glBindFramebuffer(0x8D40, 22)", "glUseProgram(23)",
+                                "glEnableVertexAttribArray(0)", "glEnableVertexAttribArray(1)",
+                                "glBindBuffer(0x8892, 0)", "glVertexAttribPointer(0, 2, 0x1406, 0, 0, ptr)",
+                                "glVertexAttribPointer(1, 2, 0x1406, 0, 0, ptr)", "glDrawArrays(5, 0, 4)"};
+        const Calls calls = RecordedGlCalls();
+        const auto draw = std::find(calls.begin(), calls.end(), "glDrawArrays(5, 0, 4)");
+        ASSERT_NE(draw, calls.end());
+        Calls copy;
+        for (auto call = calls.begin(); call != draw + 1; ++call)
+            if (call->compare(0, 5, "glGet") != 0 && call->compare(0, 11, "glIsEnabled") != 0) copy.push_back(*call);
+        EXPECT_EQ(copy, expected);
+        const RecorderState& state = *RecorderGetState();
+        for (uint32_t i = 0; i < state.m_call_count; ++i) {
+            const RecordedCall& call = state.m_calls[i];
+            if (call.m_index != ovo::GL_ENTRY_glVertexAttribPointer || call.m_arguments[0] != 1) continue;
+            const auto* coordinates = reinterpret_cast<const GLfloat*>(call.m_arguments[5]);
+            EXPECT_EQ(std::vector<GLfloat>(coordinates, coordinates + 8),
+                      std::vector<GLfloat>(half.m_coordinates, half.m_coordinates + 8));
+            break;
+        }
+    }
 }
 
 }  // namespace

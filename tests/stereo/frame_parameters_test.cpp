@@ -1,7 +1,9 @@
 // The ramp, the sprite depth planes and the frame boundary.
 #include "present/matrix4.h"
 #include "present/viewer_tracker.h"
+#include "stereo/draw_call.h"
 #include "stereo/frame_parameters.h"
+#include "stereo/overlay_target.h"
 #include "stereo_fixture.h"
 
 namespace {
@@ -119,6 +121,48 @@ TEST_F(FrameParametersTest, TheFrameBoundaryTakesTheViewersEstimateAndRestartsTh
     EXPECT_EQ(Manager().m_frame_draws, 0u);
     EXPECT_EQ(Manager().m_last_texture, 0u);
     EXPECT_EQ(Manager().m_frame_number, frame + 1);
+}
+
+// The overlay collected during the frame goes into it at the mode's size: once, unshifted,
+// without shader conversion; into both halves with it, at the screen's or the target's size.
+TEST_F(FrameParametersTest, TheFrameBoundaryComposesTheOverlayAtTheModesSize) {
+    using Calls = std::vector<std::string>;
+    const Calls single = {"glOrthof(0, 1280, 720, 0, -1, 1)", "glViewport(0, 0, 1280, 720)", "glDrawArrays(5, 0, 4)"};
+    const struct {
+        bool m_shader_convert;
+        bool m_use_screen_size;
+        bool m_content;
+        Calls m_composed;
+    } cases[] = {
+        {false, false, true, single},
+        {false, true, true, single},
+        {true, true, true,
+         {"glOrthof(0, 640, 720, 0, -1, 1)", "glViewport(0, 0, 640, 720)", "glDrawArrays(5, 0, 4)",
+          "glViewport(640, 0, 640, 720)", "glDrawArrays(5, 0, 4)"}},
+        {true, false, true,
+         {"glOrthof(0, 400, 480, 0, -1, 1)", "glViewport(0, 0, 400, 480)", "glDrawArrays(5, 0, 4)",
+          "glViewport(400, 0, 400, 480)", "glDrawArrays(5, 0, 4)"}},
+        {true, false, false, {}},
+    };
+    Profile().m_eye_target = true;
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
+    recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_VIEWPORT, {1, 2, 3, 4});
+    ovo::OverlayTarget& overlay = *Manager().m_overlay;
+    overlay.Create();
+    for (const auto& each : cases) {
+        Profile().m_shader_convert = each.m_shader_convert;
+        Profile().m_use_screen_size = each.m_use_screen_size;
+        overlay.Clear();
+        if (each.m_content) overlay.DrawInto(Manager(), ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 3));
+        ResetRecorder();
+        ovo::BeginFrame(Manager());
+        Calls composed = Only({"glOrthof", "glViewport", "glDrawArrays"});
+        if (!composed.empty()) {
+            EXPECT_EQ(composed.back(), "glViewport(1, 2, 3, 4)") << "the application's viewport is put back";
+            composed.pop_back();
+        }
+        EXPECT_EQ(composed, each.m_composed) << &each - cases;
+    }
 }
 
 }  // namespace

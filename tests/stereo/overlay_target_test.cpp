@@ -58,6 +58,17 @@ TEST_F(OverlayTargetTest, ARepeatedReleaseDeletesNothingTwice) {
     EXPECT_EQ(m_overlay.Framebuffer(), 7u);
 }
 
+// With the application's own framebuffer bound, overlay draws go there.
+TEST_F(OverlayTargetTest, DrawsKeepTheApplicationsFramebuffer) {
+    m_overlay.Create();
+    m_overlay.SetBoundFramebuffer(5);
+    ResetRecorder();
+    m_overlay.DrawInto(Manager(), ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 3));
+    EXPECT_EQ(RecordedGlCalls(), (Calls{"glViewport(0, 0, 800, 480)", "glScissor(0, 0, 800, 480)",
+                                        "glDrawArrays(4, 0, 3)"}));
+    EXPECT_EQ(m_overlay.BoundFramebuffer(), 5u);
+}
+
 TEST_F(OverlayTargetTest, ClearKeepsTheBindingTheApplicationBelievesIn) {
     m_overlay.Create();
     m_overlay.SetBoundFramebuffer(5);
@@ -119,6 +130,7 @@ TEST_F(OverlayTargetTest, FlushComposesPendingContentIntoBothHalvesAndPutsStateB
               (Calls{quads[0], quads[1], "glDrawArrays(5, 0, 4)", quads[2], quads[3],
                      "glDrawArrays(5, 0, 4)"}));
     EXPECT_EQ(calls[1 + 35], "glOrthof(0, 640, 720, 0, -1, 1)");
+    EXPECT_EQ(calls[53], "glBlendFunc(1, 0x0303)") << "the overlay holds premultiplied colour";
     EXPECT_FALSE(m_overlay.HasContent());
     // Nothing pending: a flush only unbinds.
     ResetRecorder();
@@ -136,11 +148,14 @@ TEST(GlObjectTrackerTest, NamesPastTheTablesGetNoRecord) {
     tracker.ForgetTexture(99999);
     EXPECT_EQ(tracker.TextureRecordOf(12)->m_width, 0u);
 
-    // 3 and 67 share a slot: the second gets none rather than the first one's size.
+    // 3 and 67 share one of the 64 slots: the second gets none rather than the first one's size.
     ovo::FramebufferRecord* first = tracker.ClaimFramebufferRecord(3);
     ASSERT_NE(first, nullptr);
     first->m_width = 640;
     EXPECT_EQ(tracker.ClaimFramebufferRecord(67), nullptr);
+    ovo::FramebufferRecord* other = tracker.ClaimFramebufferRecord(35);  // a slot of its own
+    EXPECT_NE(other, nullptr);
+    EXPECT_NE(other, first);
     EXPECT_EQ(tracker.ClaimFramebufferRecord(3), first);
     EXPECT_EQ(tracker.ClaimFramebufferRecord(0), nullptr);
 }

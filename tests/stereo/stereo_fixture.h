@@ -64,6 +64,35 @@ protected:
         return kept;
     }
 
+    // The ramp on or off, interleaving, the ramp's selector, and the call that each draw of
+    // a frame shows at textures 1, 2 and 3.
+    struct RampCase {
+        uint32_t m_ramp;
+        bool m_interleave;
+        uint32_t m_param;
+        std::vector<std::string> m_seen;
+    };
+
+    // Starts a frame under `each`'s settings and issues `draw` with each of textures 1, 2 and
+    // 3 bound; the call at `index` among each draw's calls to `name`.
+    template <typename Draw>
+    static std::vector<std::string> AtThreeTextures(const RampCase& each, Draw draw, const std::string& name,
+                                                    size_t index) {
+        Interleave(each.m_interleave);
+        Profile().m_ramp = each.m_ramp;
+        Profile().m_ramp_param = each.m_param;
+        Manager().m_frame_draws = 0;
+        Manager().m_last_texture = 0;
+        std::vector<std::string> seen;
+        for (GLint texture = 1; texture <= 3; ++texture) {
+            recorded_calls::AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {texture});
+            ResetRecorder();
+            draw();
+            seen.push_back(Only({name}).at(index));
+        }
+        return seen;
+    }
+
     static const std::vector<GLfloat> IDENTITY;
     // glFrustumf(-1, 1, -1, 1, 1, 10): element 11 is -1, element 15 is 0.
     static const std::vector<GLfloat> PERSPECTIVE;
