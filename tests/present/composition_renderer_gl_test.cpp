@@ -243,6 +243,41 @@ void SetGl1ApplicationState() {
     glTexCoordPointer(2, GL_FLOAT, 8, COORDINATES);
 }
 
+// llvmpipe under qemu-arm samples a GL_LINEAR texture at one place wherever it is drawn
+// (measured: a 64 x 32 red | green texture drawn 1:1 came out (129, 125, 0) in every column,
+// a 2 x 1 one red in every column), so the overlay's placement cannot be seen there. Draws a
+// red | green texture with ES 1.x and reads its first column back red and its last green.
+bool LinearTexturesSampleWhereAsked(int32_t width, int32_t height) {
+    static const GLubyte TEXELS[] = {255, 0, 0, 255, 0, 255, 0, 255};
+    static const GLfloat COORDINATES[] = {0, 0, 1, 0, 0, 1, 1, 1};
+    static const GLfloat CORNERS[] = {-1, -1, 1, -1, -1, 1, 1, 1};
+    GLuint texture = 0;
+    glGenTextures(1, &texture);
+    glBindTexture(GL_TEXTURE_2D, texture);
+    glTexImage2D(GL_TEXTURE_2D, 0, GL_RGBA, 2, 1, 0, GL_RGBA, GL_UNSIGNED_BYTE, TEXELS);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MIN_FILTER, GL_LINEAR);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_MAG_FILTER, GL_LINEAR);
+    glTexParameteri(GL_TEXTURE_2D, GL_TEXTURE_WRAP_S, GL_CLAMP_TO_EDGE);
+    glTexEnvi(GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, GL_REPLACE);
+    glEnable(GL_TEXTURE_2D);
+    glViewport(0, 0, width, height);
+    glTexCoordPointer(2, GL_FLOAT, 0, COORDINATES);
+    glVertexPointer(2, GL_FLOAT, 0, CORNERS);
+    glEnableClientState(GL_TEXTURE_COORD_ARRAY);
+    glEnableClientState(GL_VERTEX_ARRAY);
+    glDrawArrays(GL_TRIANGLE_STRIP, 0, 4);
+    GLubyte first[4] = {};
+    GLubyte last[4] = {};
+    glReadPixels(0, 0, 1, 1, GL_RGBA, GL_UNSIGNED_BYTE, first);
+    glReadPixels(width - 1, 0, 1, 1, GL_RGBA, GL_UNSIGNED_BYTE, last);
+    glDisableClientState(GL_TEXTURE_COORD_ARRAY);
+    glDisableClientState(GL_VERTEX_ARRAY);
+    glDisable(GL_TEXTURE_2D);
+    glBindTexture(GL_TEXTURE_2D, 0);
+    glDeleteTextures(1, &texture);
+    return first[0] > 200 && first[1] < 50 && last[0] < 50 && last[1] > 200;
+}
+
 class StateOnMesa : public CompositionOnMesa {
 protected:
     // `own` and the shared probes, but for `left_as_drawn`.
@@ -285,6 +320,7 @@ TEST_F(StateOnMesa, TheGl1PathLeavesTheApplicationsStateAsItWas) {
 // but for the scissor box, which stays as drawn.
 TEST_F(StateOnMesa, TheOverlayCompositionPlacesEachEyeAndLeavesTheApplicationsState) {
     Open(PATH_GL1, 64, 32);
+    const bool placement_visible = LinearTexturesSampleWhereAsked(64, 32);
     ovo::StereoManager& manager = ovo::StereoManager::instance();
     manager.m_profile->m_eye_shift = 8.0f / 400.0f;
     ovo::OverlayTarget overlay(64, 32, ovo::OVERLAY_CREATE_OBJECTS);
@@ -317,6 +353,7 @@ TEST_F(StateOnMesa, TheOverlayCompositionPlacesEachEyeAndLeavesTheApplicationsSt
         SetSharedApplicationState();
         SetGl1ApplicationState();
         ExpectStateKept(Probes(GL1_PROBES, std::size(GL1_PROBES), GL_SCISSOR_BOX), [&] { each.m_compose(overlay); });
+        if (!placement_visible) continue;
         std::vector<GLubyte> pixels(64 * 32 * 4);
         glReadPixels(0, 0, 64, 32, GL_RGBA, GL_UNSIGNED_BYTE, pixels.data());
         for (int half = 0; half < 2; ++half) {
@@ -333,6 +370,7 @@ TEST_F(StateOnMesa, TheOverlayCompositionPlacesEachEyeAndLeavesTheApplicationsSt
             EXPECT_EQ(green, (32 - each.m_red_columns[half]) * 32) << "half " << half;
         }
     }
+    if (!placement_visible) GTEST_SKIP() << "state checked; placement not: this Mesa filters GL_LINEAR textures wrongly";
 }
 
 // Attribute 0 as an application leaves it, unlike the mask's and GL's defaults.
