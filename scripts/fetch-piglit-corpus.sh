@@ -10,7 +10,7 @@
 # cannot be had; the corpus test then fails too.
 set -euo pipefail
 dir="${1:?usage: fetch-piglit-corpus.sh DIR}"
-stamp="$dir/extracted-with-programs"
+stamp="$dir/extracted-shader-tests"
 [ -e "$stamp" ] && exit 0
 
 fail() {
@@ -36,15 +36,19 @@ if [ ! -e "${debs[0]}" ]; then
 fi
 
 extract="$(mktemp -d "$dir/extract.XXXXXX")"
+# piglit keeps its shader tests in one folder below tests/, glsl-es-1.00 among them; the
+# .vert files of the other folders are taken too, and left with the extract.
 dpkg-deb --fsys-tarfile "${debs[0]}" |
-  tar -x -C "$extract" --wildcards './usr/lib/*/piglit/tests/spec/glsl-es-1.00/*' \
-    './usr/lib/*/piglit/tests/spec/*.vert' './usr/lib/*/piglit/bin/arb_point_sprite-checkerboard_gles1' \
+  tar -x -C "$extract" --wildcards './usr/lib/*/piglit/tests/*.vert' \
+    './usr/lib/*/piglit/tests/*/glsl-es-1.00/*' './usr/lib/*/piglit/bin/arb_point_sprite-checkerboard_gles1' \
     './usr/lib/*/piglit/lib/libpiglitutil.so*' './usr/lib/*/piglit/lib/libpiglitutil_gles1.so*' ||
   fail "could not extract the shaders and the program from ${debs[0]} (delete it to fetch it again)"
 piglit=("$extract"/usr/lib/*/piglit)
-[ -d "${piglit[0]}/tests/spec/glsl-es-1.00" ] || fail "${debs[0]} holds no tests/spec/glsl-es-1.00"
+es_100=("${piglit[0]}"/tests/*/glsl-es-1.00)
+[ -d "${es_100[0]}" ] || fail "${debs[0]} holds no glsl-es-1.00 folder below tests/"
 [ -x "${piglit[0]}/bin/arb_point_sprite-checkerboard_gles1" ] || fail "${debs[0]} holds no arb_point_sprite-checkerboard_gles1"
-rm -rf "$dir/tests" "$dir/bin" "$dir/lib"
-mv "${piglit[0]}/tests" "${piglit[0]}/bin" "${piglit[0]}/lib" "$dir/"
+rm -rf "$dir/tests" "$dir/shader-tests" "$dir/bin" "$dir/lib"
+mv "$(dirname "${es_100[0]}")" "$dir/shader-tests"
+mv "${piglit[0]}/bin" "${piglit[0]}/lib" "$dir/"
 touch "$stamp"
-echo "fetch-piglit-corpus: extracted $(find "$dir/tests" -type f | wc -l) files into $dir/tests"
+echo "fetch-piglit-corpus: extracted $(find "$dir/shader-tests" -type f | wc -l) files into $dir/shader-tests"

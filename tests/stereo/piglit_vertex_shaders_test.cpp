@@ -20,9 +20,9 @@ namespace {
 
 namespace fs = std::filesystem;
 
-// The piglit package's tests/ folder, extracted by scripts/fetch-piglit-corpus.sh.
-const fs::path PIGLIT_TESTS = fs::path(OVO_PIGLIT_DIR) / "tests";
-const std::string ES_100_FOLDER = "spec/glsl-es-1.00/";
+// The piglit package's folder of shader tests, extracted by scripts/fetch-piglit-corpus.sh.
+const fs::path PIGLIT_TESTS = fs::path(OVO_PIGLIT_DIR) / "shader-tests";
+const std::string ES_100_FOLDER = "glsl-es-1.00/";
 
 // A shader that Mesa compiles as written but not after the injection.
 struct Exception {
@@ -35,7 +35,7 @@ struct Exception {
 const std::vector<Exception> EXCEPTIONS = {};
 
 struct CorpusShader {
-    std::string m_name;  // the path below tests/, with " [vertex shader N]" for a section
+    std::string m_name;  // the path below PIGLIT_TESTS, with " [vertex shader N]" for a section
     std::vector<std::string> m_strings;  // as piglit hands them to glShaderSource
     std::string m_expect_result;         // a .vert's own verdict, pass or fail
 };
@@ -77,12 +77,12 @@ void AddSections(const std::string& name, const std::string& text,
     }
 }
 
-// Every *.vert below spec/glsl-es-1.00, the [vertex shader] sections of its *.shader_test,
+// Every *.vert below glsl-es-1.00, the [vertex shader] sections of its *.shader_test,
 // and every other *.vert whose [config] says glsl_version 1.00; in path order.
 std::vector<CorpusShader> ReadCorpus(int* sections) {
     std::vector<fs::path> paths;
     std::error_code error;
-    for (fs::recursive_directory_iterator it(PIGLIT_TESTS / "spec", error), end;
+    for (fs::recursive_directory_iterator it(PIGLIT_TESTS, error), end;
          !error && it != end; it.increment(error)) {
         if (it->is_regular_file()) paths.push_back(it->path());
     }
