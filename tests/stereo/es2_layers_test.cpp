@@ -120,9 +120,7 @@ TEST_F(Es2LayerTest, AWindowDrawSetsEachEyesUniformThroughTheMask) {
     } cases[] = {{&m_direct, Join({{"glGetIntegerv(0x8CA6, ptr)", "glEnable(0x0B90)"}, lookup, eyes})},
                  {&m_tracked, Join({lookup, {"glEnable(0x0B90)"}, eyes})}};
     for (const auto& each : cases) {
-        ResetRecorder();
-        each.m_layer->glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(RecordedGlCalls(), each.m_expected) << &each - cases;
+        EXPECT_EQ(Drawn(*each.m_layer), each.m_expected) << &each - cases;
     }
     EXPECT_EQ(Manager().m_program, PROGRAM);
     EXPECT_EQ(Manager().m_depth_shift_location, LOCATION);
@@ -175,16 +173,12 @@ TEST_F(Es2LayerTest, EachWindowDrawScalesTheEyesHalvesByTheOutputsFactors) {
     Interleave(false);
     ScaleOutput();
     for (ovo::Es2StereoLayer* layer : {&m_direct, &m_tracked}) {
-        ResetRecorder();
-        layer->glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(Only({"glViewport", "glScissor"}), SCALED_HALVES) << (layer == &m_direct ? "direct" : "tracked");
+        EXPECT_EQ(Drawn(*layer, {"glViewport", "glScissor"}), SCALED_HALVES) << (layer == &m_direct ? "direct" : "tracked");
     }
     AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
     MakeRenderTexture(m_tracked);
     m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 0);
-    ResetRecorder();
-    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-    EXPECT_EQ(Only({"glViewport", "glScissor"}),
+    EXPECT_EQ(Drawn(m_tracked, {"glViewport", "glScissor"}),
               Join({{"glViewport(0, 0, 128, 64)", "glViewport(10, 20, 401, 243)"}, SCALED_HALVES}));
 }
 
@@ -440,9 +434,7 @@ TEST_F(TrackedLayerTest, EachContextKeepsItsOwnEyeTexturesUntilItEnds) {
     const std::pair<EGLContext, size_t> draws[] = {{first, 2}, {second, 2}, {first, 0}, {second, 0}};
     for (auto [context, textures_made] : draws) {
         ASSERT_EQ(m_egl.MakeCurrent(context), EGL_TRUE);
-        ResetRecorder();
-        m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(Only({"glGenTextures"}).size(), textures_made);
+        EXPECT_EQ(Drawn(m_tracked, {"glGenTextures"}).size(), textures_made);
     }
     ResetRecorder();
     ASSERT_NE(eglDestroyContext(m_egl.m_display, first), EGL_FALSE);

@@ -163,9 +163,7 @@ TEST_F(HostileSizesTest, TheSecondEyeOfADoubleWidthDrawSaturates) {
     for (const Case& each : cases) {
         MakeRenderTexture(m_tracked, each.m_texture_width);
         Manager().m_viewport = {each.m_x, 0, 128, 64};
-        ResetRecorder();
-        m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(Only({"glViewport"}), (Calls{RectCall("glViewport", {each.m_x, 0, 128, 64}),
+        EXPECT_EQ(Drawn(m_tracked, {"glViewport"}), (Calls{RectCall("glViewport", {each.m_x, 0, 128, 64}),
                                                RectCall("glViewport", {each.m_second_x, 0, 128, 64})}))
             << each.m_x << " + " << each.m_texture_width;
     }
@@ -191,9 +189,7 @@ TEST_F(HostileSizesTest, SpriteShiftsOfExtremeEyeDistancesSaturate) {
     for (const Case& each : cases) {
         glTexParameterf(ovo::STEREO_PARAM_EYE_DISTANCE, GL_TEXTURE_MIN_FILTER, each.m_distance);
         Manager().m_depth_plane = -5.0f;
-        ResetRecorder();
-        sprites.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(Only({"glTranslatef"}), (Calls{each.m_first, each.m_other})) << each.m_distance;
+        EXPECT_EQ(Drawn(sprites, {"glTranslatef"}), (Calls{each.m_first, each.m_other})) << each.m_distance;
     }
 }
 

@@ -107,6 +107,13 @@ protected:
         return kept;
     }
 
+    // One draw of three vertices through `layer`: its calls, or its calls to the named functions.
+    static Calls Drawn(ovo::GlLayer& layer, const Calls& names = {}) {
+        ResetRecorder();
+        layer.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        return names.empty() ? recorded_calls::RecordedGlCalls() : Only(names);
+    }
+
     // The ramp on or off, interleaving, the ramp's selector, and the call that each draw of
     // a frame shows at textures 1, 2 and 3.
     struct RampCase {
