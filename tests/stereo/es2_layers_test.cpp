@@ -256,15 +256,6 @@ const Rename RENAMES[] = {
      RENAME_KEEPS_THE_REST, 0},
 };
 
-// Draws once into the window; how many eyes set the stock wallpaper's own separation.
-int WallpaperSetups(ovo::Es2StereoLayer& layer, ovo::StereoManager& manager) {
-    ResetRecorder();
-    layer.glDrawArrays(manager, GL_TRIANGLES, 0, 3);
-    const Calls calls = RecordedGlCalls();
-    return static_cast<int>(std::count(calls.begin(), calls.end(), "glUniform2f(4, 0.1, 0.05)") +
-                            std::count(calls.begin(), calls.end(), "glUniform2f(4, -0.1, -0.05)"));
-}
-
 // Run under a case's command line: a draw, the case's rename, a draw, and what the profile
 // and the file then say.
 TEST_F(Es2LayerTest, DISABLED_PrintDrawsAcrossARename) {
@@ -277,18 +268,24 @@ TEST_F(Es2LayerTest, DISABLED_PrintDrawsAcrossARename) {
     ASSERT_LE(rename.m_written.size(), area_length);
     Interleave(true);
     Profile().m_ramp = ovo::STEREO_RAMP_OFF;
-    const int before = WallpaperSetups(m_direct, Manager());
+    // Draws once into the window; how many eyes set the stock wallpaper's own separation.
+    auto wallpaper_setups = [&] {
+        const Calls calls = Drawn(m_direct);
+        return std::count(calls.begin(), calls.end(), "glUniform2f(4, 0.1, 0.05)") +
+               std::count(calls.begin(), calls.end(), "glUniform2f(4, -0.1, -0.05)");
+    };
+    const auto before = wallpaper_setups();
     prctl(PR_SET_NAME, rename.m_written.c_str());
     char* area = program_invocation_name;
     std::memcpy(area, rename.m_written.data(), rename.m_written.size());
     if (rename.m_rest != RENAME_KEEPS_THE_REST) {
         std::memset(area + rename.m_written.size(), rename.m_rest, area_length - rename.m_written.size());
     }
-    const int after = WallpaperSetups(m_direct, Manager());
+    const auto after = wallpaper_setups();
     char name[ovo::PROFILE_PROCESS_NAME_CAPACITY];
     ovo::StereoProfile::ReadProcessName(name);
-    std::printf("wallpaper setups %d then %d, detected %d, file %d\n", before, after,
-                Profile().DetectLiveWallpaper(), ovo::LiveWallpaperKindOf(name));
+    std::printf("wallpaper setups %d then %d, detected %d, file %d\n", static_cast<int>(before),
+                static_cast<int>(after), Profile().DetectLiveWallpaper(), ovo::LiveWallpaperKindOf(name));
 }
 
 TEST(Es2WallpaperTest, ARenameIsSeenAtTheNextDrawAsTheFileShowsIt) {
@@ -309,29 +306,6 @@ TEST(Es2WallpaperTest, ARenameIsSeenAtTheNextDrawAsTheFileShowsIt) {
 }
 
 class TrackedLayerTest : public Es2LayerTest {};
-
-TEST_F(TrackedLayerTest, RenderTexturesAndRenderbuffersBecomeTwiceAsWide) {
-    MakeRenderTexture(m_tracked);
-    m_tracked.glRenderbufferStorage(Manager(), GL_RENDERBUFFER, GL_DEPTH_COMPONENT16, 128, 64);
-    const Calls expected = {
-        "glBindTexture(0x0DE1, 5)", "glTexImage2D(0x0DE1, 0, 6408, 128, 64, 0, 0x1908, 0x1401, null)",
-        "glBindFramebuffer(0x8D40, 3)", "glFramebufferTexture2D(0x8D40, 0x8CE0, 0x0DE1, 5, 0)",
-        "glBindTexture(0x0DE1, 5)", "glTexImage2D(0x0DE1, 0, 6408, 256, 64, 0, 0x1908, 0x1401, null)",
-        "glBindTexture(0x0DE1, 5)", "glRenderbufferStorage(0x8D41, 0x81A5, 256, 64)"};
-    EXPECT_EQ(RecordedGlCalls(), expected);
-    const ovo::FramebufferRecord* framebuffer = Manager().m_objects->FindFramebufferRecord(3);
-    ASSERT_NE(framebuffer, nullptr);
-    EXPECT_EQ(framebuffer->m_width, 128u);
-    EXPECT_EQ(framebuffer->m_height, 64u);
-    // 67 shares 3's slot and so has no record of its own.
-    EXPECT_EQ(Manager().m_objects->FindFramebufferRecord(67), nullptr);
-
-    // Deleted, the name is forgotten: a new texture of that name starts unbound.
-    const GLuint name = 5;
-    m_tracked.glDeleteTextures(Manager(), 1, &name);
-    EXPECT_EQ(Manager().m_objects->TextureRecordOf(5)->m_attached, 0u);
-    EXPECT_EQ(Manager().m_objects->TextureRecordOf(5)->m_width, 0u);
-}
 
 TEST_F(TrackedLayerTest, UntrackedNamesAndUnsizedTexturesAreNeverRespecified) {
     struct Case {
@@ -360,7 +334,9 @@ TEST_F(TrackedLayerTest, UntrackedNamesAndUnsizedTexturesAreNeverRespecified) {
     EXPECT_EQ(RecordedGlCalls().size(), 1u) << "deleted";
 }
 
-TEST_F(TrackedLayerTest, WideningPutsBackTheTextureTheApplicationHasBound) {
+// Attached, a texture gets twice its width (renderbuffers: HostileSizesTest) and the texture the
+// application has bound comes back; the framebuffer keeps the size it was given.
+TEST_F(TrackedLayerTest, RenderTexturesBecomeTwiceAsWideAndTheBoundTextureComesBack) {
     m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, 5);
     m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGB, 100, 50, 0, GL_RGB, GL_UNSIGNED_SHORT_5_6_5, nullptr);
     m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, 8);
@@ -371,6 +347,17 @@ TEST_F(TrackedLayerTest, WideningPutsBackTheTextureTheApplicationHasBound) {
                             "glTexImage2D(0x0DE1, 0, 6407, 200, 50, 0, 0x1907, 0x8363, null)",
                             "glBindTexture(0x0DE1, 8)"};
     EXPECT_EQ(RecordedGlCalls(), expected);
+    const ovo::FramebufferRecord* framebuffer = Manager().m_objects->FindFramebufferRecord(3);
+    ASSERT_NE(framebuffer, nullptr);
+    EXPECT_EQ(framebuffer->m_width, 100u);
+    EXPECT_EQ(framebuffer->m_height, 50u);
+    // 67 shares 3's slot and so has no record of its own.
+    EXPECT_EQ(Manager().m_objects->FindFramebufferRecord(67), nullptr);
+    // Deleted, the name is forgotten: a new texture of that name starts unbound.
+    const GLuint name = 5;
+    m_tracked.glDeleteTextures(Manager(), 1, &name);
+    EXPECT_EQ(Manager().m_objects->TextureRecordOf(5)->m_attached, 0u);
+    EXPECT_EQ(Manager().m_objects->TextureRecordOf(5)->m_width, 0u);
 }
 
 TEST_F(TrackedLayerTest, EachEyeDrawsIntoItsHalfOfTheApplicationsFramebuffer) {
@@ -378,12 +365,10 @@ TEST_F(TrackedLayerTest, EachEyeDrawsIntoItsHalfOfTheApplicationsFramebuffer) {
     MakeRenderTexture(m_tracked);
     // Narrower than the texture: eye 1 starts at the texture's own width.
     Manager().m_viewport = {3, 0, 64, 32};
-    ResetRecorder();
-    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
     const Calls expected = {"glGetIntegerv(0x8B8D, ptr)", "glGetUniformLocation(9, ptr)", "glViewport(3, 0, 64, 32)",
                             "glUniform2f(4, 0.25, 0.5)",  "glDrawArrays(4, 0, 3)",        "glViewport(131, 0, 64, 32)",
                             "glUniform2f(4, -0.25, -0.5)", "glDrawArrays(4, 0, 3)"};
-    EXPECT_EQ(RecordedGlCalls(), expected);
+    EXPECT_EQ(Drawn(m_tracked), expected);
 }
 
 TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
@@ -398,8 +383,9 @@ TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
     m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);  // makes the eye textures
     // The vendor gave both the same names; eye 1's texture is told apart here.
     Manager().m_eye_textures->Find(ovo::CurrentContext())->m_eyes[1].m_texture = 31;
-    ResetRecorder();
-    m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+    const Calls drawn = Drawn(m_tracked, {"glGetUniformLocation", "glDisable", "glEnable", "glViewport",
+                                          "glBindFramebuffer", "glDrawArrays", "glBindTexture", "glUniform2f",
+                                          "glStencilFunc"});
     // Both copies sample texture 5 (still bound) into the eye textures' framebuffer; the
     // window's viewport comes back before the eyes draw, each with its own texture.
     const Calls copy = {"glDisable(0x0B71)", "glBindFramebuffer(0x8D40, 22)", "glDrawArrays(5, 0, 4)",
@@ -410,9 +396,7 @@ TEST_F(TrackedLayerTest, ARenderTextureDrawnToTheWindowGivesEachEyeItsOwnHalf) {
           "glUniform2f(4, 0.25, 0.5)", "glStencilFunc(0x0202, 1, 1)", "glDrawArrays(4, 0, 3)",
           "glBindTexture(0x0DE1, 31)", "glUniform2f(4, -0.25, -0.5)", "glStencilFunc(0x0202, 0, 1)",
           "glDrawArrays(4, 0, 3)", "glDisable(0x0B90)", "glBindTexture(0x0DE1, 5)"}});
-    EXPECT_EQ(Only({"glGetUniformLocation", "glDisable", "glEnable", "glViewport", "glBindFramebuffer",
-                    "glDrawArrays", "glBindTexture", "glUniform2f", "glStencilFunc"}),
-              expected);
+    EXPECT_EQ(drawn, expected);
     // Eye 0's copy samples the left half, eye 1's the right: the first texture coordinates.
     std::vector<GLfloat> first_coordinates;
     for (const GLfloat* coordinates : CoordinatesPointed()) {
@@ -448,30 +432,25 @@ TEST_F(TrackedLayerTest, EachContextKeepsItsOwnEyeTexturesUntilItEnds) {
     EXPECT_EQ(RecordedCalls(true), expected);
 }
 
-// Twice the output's width: here the screen, wider than the target.
-TEST_F(TrackedLayerTest, ClearsCoverTheDoubleWidth) {
-    Profile().m_width = 1280;
-    Profile().m_height = 720;
-    m_tracked.glClear(Manager(), GL_COLOR_BUFFER_BIT);
-    m_direct.glClear(Manager(), GL_DEPTH_BUFFER_BIT);
-    EXPECT_EQ(RecordedGlCalls(), Calls({"glScissor(0, 0, 2560, 720)", "glClear(0x4000)", "glClear(0x0100)"}));
-}
-
-TEST_F(Es2LayerTest, TheScaledLayerScalesWindowDrawsAndClearsOnly) {
+// The tracked layer's clears cover twice the output's width (here the screen, wider than the
+// target), the direct layer's are the application's; the plain mode scales clears and window
+// draws, with no 0.5 anywhere: 401 x 1.6 = 641.6 gives 641.
+TEST_F(Es2LayerTest, ClearsCoverTheDoubleWidthAndTheScaledLayerScalesWindowDrawsAndClearsOnly) {
     Profile().m_width = 1280;
     Profile().m_height = 720;
     Manager().UpdateScale();
     Manager().m_viewport = {10, 20, 401, 240};
     Manager().m_scissor = {0, 0, 801, 480};
+    m_tracked.glClear(Manager(), GL_COLOR_BUFFER_BIT);
+    m_direct.glClear(Manager(), GL_DEPTH_BUFFER_BIT);
     m_scaled.glClear(Manager(), GL_COLOR_BUFFER_BIT);
     m_scaled.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
     m_scaled.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 3);
     m_scaled.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-    // No 0.5 anywhere: 401 x 1.6 = 641.6 gives 641.
-    const Calls expected = {"glScissor(0, 0, 1281, 720)", "glClear(0x4000)",
-                            "glViewport(16, 30, 641, 360)", "glDrawArrays(4, 0, 3)",
-                            "glBindFramebuffer(0x8D40, 3)", "glViewport(10, 20, 401, 240)",
-                            "glDrawArrays(4, 0, 3)"};
+    const Calls expected = {"glScissor(0, 0, 2560, 720)",   "glClear(0x4000)",       "glClear(0x0100)",
+                            "glScissor(0, 0, 1281, 720)",   "glClear(0x4000)",       "glViewport(16, 30, 641, 360)",
+                            "glDrawArrays(4, 0, 3)",        "glBindFramebuffer(0x8D40, 3)",
+                            "glViewport(10, 20, 401, 240)", "glDrawArrays(4, 0, 3)"};
     EXPECT_EQ(RecordedGlCalls(), expected);
 }
 
@@ -525,17 +504,16 @@ TEST_F(Es2LayerTest, EyeTexturesSampleLinearlyAndFollowEverySizeChange) {
                           "glTexParameteri(0x0DE1, 0x2800, 9729)", "glTexParameteri(0x0DE1, 0x2802, 33071)",
                           "glTexParameteri(0x0DE1, 0x2803, 33071)", "glBindFramebuffer(0x8D40, 22)",
                           "glFramebufferTexture2D(0x8D40, 0x8CE0, 0x0DE1, 21, 0)"};
-    Calls both = target;
-    both.insert(both.end(), target.begin(), target.end());
-    both.insert(both.end(), {"glBindTexture(0x0DE1, 0)", "glBindFramebuffer(0x8D40, 0)"});  // put back
-    EXPECT_EQ(Only({"glBindTexture", "glTexParameteri", "glBindFramebuffer", "glFramebufferTexture2D"}), both);
+    const Calls put_back = {"glBindTexture(0x0DE1, 0)", "glBindFramebuffer(0x8D40, 0)"};
+    EXPECT_EQ(Only({"glBindTexture", "glTexParameteri", "glBindFramebuffer", "glFramebufferTexture2D"}),
+              Join({target, target, put_back}));
 
     const struct {
         GLuint m_width;
         GLuint m_height;
         bool m_storage;
-    } sizes[] = {{128, 64, true}, {128, 64, false}, {128, 32, true}, {64, 32, true},
-                 {0, 32, false},  {64, 32, true},   {64, 0, false}};
+    } sizes[] = {{128, 64, true}, {128, 64, false}, {128, 32, true}, {64, 32, true}, {0, 32, false},
+                 {64, 32, true},  {64, 0, false}};
     for (const auto& each : sizes) {
         ResetRecorder();
         pair.m_eyes[0].Resize(each.m_width, each.m_height);

@@ -187,14 +187,14 @@ TEST_F(DepthShiftOnMesa, PiglitGlslEs100VertexShadersStillCompileWithTheDeclarat
             strings.push_back(each.c_str());
             written += each;
         }
-        const CompiledShader as_written = CompileNatively(GL_VERTEX_SHADER, strings);
+        const CompiledShader as_written = Compile(GL_VERTEX_SHADER, strings, false);
         if (!as_written.m_compiled) {
             left_out.push_back(shader.m_name + " (expect_result: " + shader.m_expect_result + ")");
             left_out_expected += shader.m_expect_result == "fail" ? 1 : 0;
             continue;
         }
         native += 1;
-        const CompiledShader result = SetAndCompile(GL_VERTEX_SHADER, strings);
+        const CompiledShader result = Compile(GL_VERTEX_SHADER, strings);
         const Exception* exception = ExceptionFor(shader.m_name);
         if (exception != nullptr) {
             met.push_back(exception);
