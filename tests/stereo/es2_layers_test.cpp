@@ -173,7 +173,7 @@ TEST_F(Es2LayerTest, EachWindowDrawScalesTheEyesHalvesByTheOutputsFactors) {
     Interleave(false);
     ScaleOutput();
     for (ovo::Es2StereoLayer* layer : {&m_direct, &m_tracked}) {
-        EXPECT_EQ(Drawn(*layer, {"glViewport", "glScissor"}), SCALED_HALVES) << (layer == &m_direct ? "direct" : "tracked");
+        EXPECT_EQ(Drawn(*layer, {"glViewport", "glScissor"}), SCALED_HALVES) << (layer == &m_tracked);
     }
     AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_TEXTURE_BINDING_2D, {5});
     MakeRenderTexture(m_tracked);
@@ -205,10 +205,8 @@ TEST(Es2WallpaperTest, TheStockWallpapersArrayDrawsAddItsOwnSeparationPerEye) {
         RunScenario("com.android.wallpaper", "Es2LayerTest.DISABLED_PrintWallpaperSeparations");
     EXPECT_EQ(result.m_exit_code, 0);
     const std::string expected =
-        "draw-log glUniform2f(4, 0.25, 0.5)\ndraw-log glUniform2f(4, 0.1, 0.05)\n"
-        "draw-log glDrawArrays(4, 0, 3)\n"
-        "draw-log glUniform2f(4, -0.25, -0.5)\ndraw-log glUniform2f(4, -0.1, -0.05)\n"
-        "draw-log glDrawArrays(4, 0, 3)\n"
+        "draw-log glUniform2f(4, 0.25, 0.5)\ndraw-log glUniform2f(4, 0.1, 0.05)\ndraw-log glDrawArrays(4, 0, 3)\n"
+        "draw-log glUniform2f(4, -0.25, -0.5)\ndraw-log glUniform2f(4, -0.1, -0.05)\ndraw-log glDrawArrays(4, 0, 3)\n"
         "draw-log glUniform2f(4, 0.25, 0.5)\ndraw-log glDrawElements(4, 3, 0x1403, null)\n"
         "draw-log glUniform2f(4, -0.25, -0.5)\ndraw-log glDrawElements(4, 3, 0x1403, null)\n";
     std::string logged;
@@ -226,10 +224,10 @@ struct Rename {
     std::string m_command_line;  // the arguments at start, separated by NULs
     std::string m_environment;   // the first environment string, which lies right past them
     std::string m_written;       // written over the arguments from the first one's start
-    int m_rest;                  // then over the rest of them, unless RENAME_KEEPS_THE_REST
+    int m_rest;                  // then over the rest of them, unless KEEP_THE_REST
     int m_kind;                  // the live-wallpaper kind after the rename
 };
-constexpr int RENAME_KEEPS_THE_REST = -1;
+constexpr int KEEP_THE_REST = -1;
 const std::string START = std::string("com.example.game\0--a-flag-long-enough-for-any-name", 50);
 
 const Rename RENAMES[] = {
@@ -238,22 +236,17 @@ const Rename RENAMES[] = {
     {"away from the wallpaper", "com.android.wallpaper", "", "com.example.game", '\0', 0},
     {"another kind", START, "", "fishnoodle.koipond", '\0', 3},
     {"the longest name", START, "", "au.com.dealsmap.lwp.cube.PackEarth", '\0', 6},
-    {"a name and its NUL, the rest kept", START, "", std::string("com.android.wallpaper\0", 22),
-     RENAME_KEEPS_THE_REST, 2},
-    {"no NUL, over a longer name", "com.android.wallpaperXYZ", "", "com.android.wallpaper",
-     RENAME_KEEPS_THE_REST, 0},
+    {"a name and its NUL, the rest kept", START, "", std::string("com.android.wallpaper\0", 22), KEEP_THE_REST, 2},
+    {"no NUL, over a longer name", "com.android.wallpaperXYZ", "", "com.android.wallpaper", KEEP_THE_REST, 0},
     {"a space in front", START, "", " com.android.wallpaper", '\0', 0},
     {"a space behind", START, "", "com.android.wallpaper ", '\0', 0},
     {"a tab behind", START, "", "com.android.wallpaper\t", '\0', 0},
     {"empty", "com.android.wallpaper", "", "", '\0', 0},
     // Without a NUL in the area the kernel reads on into the environment.
     {"no NUL left in the area", START, "", "com.android.wallpaper", 'x', 0},
-    {"no NUL, the environment ends the wallpaper's name", "cX", ".android.wallpaper", "com",
-     RENAME_KEEPS_THE_REST, 2},
-    {"no NUL, the environment ends another name", "cX", ".android.wallpaper.x", "com",
-     RENAME_KEEPS_THE_REST, 0},
-    {"no NUL, no wallpaper's name begins so", "xX", ".android.wallpaper", "xom",
-     RENAME_KEEPS_THE_REST, 0},
+    {"no NUL, the environment ends the wallpaper's name", "cX", ".android.wallpaper", "com", KEEP_THE_REST, 2},
+    {"no NUL, the environment ends another name", "cX", ".android.wallpaper.x", "com", KEEP_THE_REST, 0},
+    {"no NUL, no wallpaper's name begins so", "xX", ".android.wallpaper", "xom", KEEP_THE_REST, 0},
 };
 
 // Run under a case's command line: a draw, the case's rename, a draw, and what the profile
@@ -278,7 +271,7 @@ TEST_F(Es2LayerTest, DISABLED_PrintDrawsAcrossARename) {
     prctl(PR_SET_NAME, rename.m_written.c_str());
     char* area = program_invocation_name;
     std::memcpy(area, rename.m_written.data(), rename.m_written.size());
-    if (rename.m_rest != RENAME_KEEPS_THE_REST) {
+    if (rename.m_rest != KEEP_THE_REST) {
         std::memset(area + rename.m_written.size(), rename.m_rest, area_length - rename.m_written.size());
     }
     const auto after = wallpaper_setups();
