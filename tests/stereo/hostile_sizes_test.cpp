@@ -23,10 +23,10 @@ constexpr float NOT_A_NUMBER = std::numeric_limits<float>::quiet_NaN();
 
 class EyeViewportTest : public StereoFixture {
 protected:
-    Calls BothEyes() {
+    static Calls BothEyes(float scale_x = 1.5f, float scale_y = 1.25f) {
         ResetRecorder();
-        ovo::ApplyEyeViewport(Manager(), 0, 1.5f, 1.25f);
-        ovo::ApplyEyeViewport(Manager(), 1, 1.5f, 1.25f);
+        ovo::ApplyEyeViewport(Manager(), 0, scale_x, scale_y);
+        ovo::ApplyEyeViewport(Manager(), 1, scale_x, scale_y);
         return recorded_calls::RecordedGlCalls();
     }
 };
@@ -67,6 +67,43 @@ TEST_F(EyeViewportTest, EachSplitAndEyeOrderPutsTheEyesInTheirHalves) {
     EXPECT_EQ(recorded_calls::RecordedGlCalls(), Calls());
 }
 
+TEST_F(EyeViewportTest, EyeViewportsOfExtremeRectanglesAndScalesSaturate) {
+    struct Case {
+        uint32_t m_split;
+        ovo::GlRect m_rect;
+        float m_scale_x;
+        float m_scale_y;
+        ovo::GlRect m_first;
+        ovo::GlRect m_other;
+    } cases[] = {
+        // Side by side: x and width scaled by half of scale x; the other eye 400 further.
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {MAX, MAX, MAX, MAX}, 4, 2, {MAX, MAX, MAX, MAX}, {MAX, MAX, MAX, MAX}},
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {MIN, MIN, MIN, MIN}, 4, 2, {MIN, MIN, MIN, MIN}, {MIN, MIN, MIN, MIN}},
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {0, 0, 0, 0}, 4, 2, {0, 0, 0, 0}, {400, 0, 0, 0}},
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {-10, -20, -30, -40}, 4, 2, {-20, -40, -59, -80}, {380, -40, -59, -80}},
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {10, 20, 401, 243}, INF, INF, {MAX, MAX, MAX, MAX}, {MAX, MAX, MAX, MAX}},
+        // 0 x infinity is NaN, and so is the other eye's 400 + NaN.
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {0, -20, 401, 243}, INF, INF, {0, MIN, MAX, MAX}, {0, MIN, MAX, MAX}},
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {10, 20, 401, 243}, NOT_A_NUMBER, NOT_A_NUMBER, {0, 0, 0, 0}, {0, 0, 0, 0}},
+        // Top and bottom: the first eye 240 higher.
+        {ovo::STEREO_SPLIT_TOP_BOTTOM, {MAX, MAX, MAX, MAX}, 2, 4, {MAX, MAX, MAX, MAX}, {MAX, MAX, MAX, MAX}},
+        {ovo::STEREO_SPLIT_TOP_BOTTOM, {MIN, MIN, MIN, MIN}, 2, 4, {MIN, MIN, MIN, MIN}, {MIN, MIN, MIN, MIN}},
+        {ovo::STEREO_SPLIT_TOP_BOTTOM, {-10, -20, -30, -40}, 2, 4, {-20, 200, -60, -79}, {-20, -40, -60, -79}},
+    };
+    Interleave(false);
+    Profile().m_eye_order = ovo::STEREO_EYE_ORDER_NORMAL;
+    for (const Case& each : cases) {
+        Profile().m_split = each.m_split;
+        const ovo::GlRect& r = each.m_rect;
+        glViewport(r.m_x, r.m_y, r.m_width, r.m_height);
+        glScissor(r.m_x, r.m_y, r.m_width, r.m_height);
+        const Calls expected = {RectCall("glViewport", each.m_first), RectCall("glScissor", each.m_first),
+                                RectCall("glViewport", each.m_other), RectCall("glScissor", each.m_other)};
+        EXPECT_EQ(BothEyes(each.m_scale_x, each.m_scale_y), expected)
+            << std::hex << each.m_split << std::dec << " " << RectCall("rect", r) << " scale " << each.m_scale_x;
+    }
+}
+
 TEST(SaturatingMath, ConversionsHoldToTheInt32RangeAndTruncateWithinIt) {
     const std::pair<float, int32_t> truncations[] = {
         {0.99f, 0},  {-0.99f, 0}, {-59.5f, -59}, {2147483520.0f, 2147483520}, {2147483648.0f, MAX},
@@ -98,45 +135,6 @@ protected:
 
     ovo::Es2StereoLayer m_tracked{ovo::LAYER_SUBMODE_TRACKED};
 };
-
-TEST_F(HostileSizesTest, EyeViewportsOfExtremeRectanglesAndScalesSaturate) {
-    struct Case {
-        uint32_t m_split;
-        ovo::GlRect m_rect;
-        float m_scale_x;
-        float m_scale_y;
-        ovo::GlRect m_first;
-        ovo::GlRect m_other;
-    } cases[] = {
-        // Side by side: x and width scaled by half of scale x; the other eye 400 further.
-        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {MAX, MAX, MAX, MAX}, 4, 2, {MAX, MAX, MAX, MAX}, {MAX, MAX, MAX, MAX}},
-        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {MIN, MIN, MIN, MIN}, 4, 2, {MIN, MIN, MIN, MIN}, {MIN, MIN, MIN, MIN}},
-        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {0, 0, 0, 0}, 4, 2, {0, 0, 0, 0}, {400, 0, 0, 0}},
-        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {-10, -20, -30, -40}, 4, 2, {-20, -40, -59, -80}, {380, -40, -59, -80}},
-        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {10, 20, 401, 243}, INF, INF, {MAX, MAX, MAX, MAX}, {MAX, MAX, MAX, MAX}},
-        // 0 x infinity is NaN, and so is the other eye's 400 + NaN.
-        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {0, -20, 401, 243}, INF, INF, {0, MIN, MAX, MAX}, {0, MIN, MAX, MAX}},
-        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, {10, 20, 401, 243}, NOT_A_NUMBER, NOT_A_NUMBER, {0, 0, 0, 0}, {0, 0, 0, 0}},
-        // Top and bottom: the first eye 240 higher.
-        {ovo::STEREO_SPLIT_TOP_BOTTOM, {MAX, MAX, MAX, MAX}, 2, 4, {MAX, MAX, MAX, MAX}, {MAX, MAX, MAX, MAX}},
-        {ovo::STEREO_SPLIT_TOP_BOTTOM, {MIN, MIN, MIN, MIN}, 2, 4, {MIN, MIN, MIN, MIN}, {MIN, MIN, MIN, MIN}},
-        {ovo::STEREO_SPLIT_TOP_BOTTOM, {-10, -20, -30, -40}, 2, 4, {-20, 200, -60, -79}, {-20, -40, -60, -79}},
-    };
-    Profile().m_eye_order = ovo::STEREO_EYE_ORDER_NORMAL;
-    for (const Case& each : cases) {
-        Profile().m_split = each.m_split;
-        const ovo::GlRect& r = each.m_rect;
-        glViewport(r.m_x, r.m_y, r.m_width, r.m_height);
-        glScissor(r.m_x, r.m_y, r.m_width, r.m_height);
-        ResetRecorder();
-        ovo::ApplyEyeViewport(Manager(), 0, each.m_scale_x, each.m_scale_y);
-        ovo::ApplyEyeViewport(Manager(), 1, each.m_scale_x, each.m_scale_y);
-        const Calls expected = {RectCall("glViewport", each.m_first), RectCall("glScissor", each.m_first),
-                                RectCall("glViewport", each.m_other), RectCall("glScissor", each.m_other)};
-        EXPECT_EQ(RecordedGlCalls(), expected)
-            << std::hex << each.m_split << std::dec << " " << RectCall("rect", r) << " scale " << each.m_scale_x;
-    }
-}
 
 // Without a target size (screen 800 x 480) the scale is infinite (screen size / 0) or NaN (0 / 0).
 TEST_F(HostileSizesTest, PlainModeWithoutATargetSizeSaturatesTheScaledRectangles) {
