@@ -33,38 +33,30 @@ public:
         manager.m_layer = new ovo::Es2StereoLayer(ovo::LAYER_SUBMODE_DIRECT);
     }
 
-    // Set through the library, which injects into vertex shaders.
-    static CompiledShader SetAndCompile(GLenum type, const std::vector<const char*>& strings,
-                                        const std::vector<GLint>& lengths = {}) {
-        const GLuint shader = glCreateShader(type);
-        glShaderSource(shader, static_cast<GLsizei>(strings.size()), strings.data(),
-                       lengths.empty() ? nullptr : lengths.data());
-        glCompileShader(shader);
-        return ReadBack(shader);
-    }
-
-    // Set on Mesa directly, as the application wrote it.
-    static CompiledShader CompileNatively(GLenum type, const std::vector<const char*>& strings,
-                                          const std::vector<GLint>& lengths = {}) {
-        const GLuint shader = ovo::raw::glCreateShader(type);
-        ovo::raw::glShaderSource(shader, static_cast<GLsizei>(strings.size()), strings.data(),
-                                 lengths.empty() ? nullptr : lengths.data());
-        ovo::raw::glCompileShader(shader);
-        return ReadBack(shader);
-    }
-
-private:
-    static CompiledShader ReadBack(GLuint shader) {
-        CompiledShader result;
+    // Set through the library, which injects into vertex shaders, or on Mesa directly, as the
+    // application wrote it.
+    static CompiledShader Compile(GLenum type, const std::vector<const char*>& strings, bool through_library = true) {
+        const GLsizei count = static_cast<GLsizei>(strings.size());
+        GLuint shader = 0;
+        if (through_library) {
+            shader = glCreateShader(type);
+            glShaderSource(shader, count, strings.data(), nullptr);
+            glCompileShader(shader);
+        } else {
+            shader = ovo::raw::glCreateShader(type);
+            ovo::raw::glShaderSource(shader, count, strings.data(), nullptr);
+            ovo::raw::glCompileShader(shader);
+        }
         GLint compiled = GL_FALSE;
         ovo::raw::glGetShaderiv(shader, GL_COMPILE_STATUS, &compiled);
-        result.m_compiled = compiled == GL_TRUE;
-        result.m_source = ReadText(shader, GL_SHADER_SOURCE_LENGTH, ovo::raw::glGetShaderSource);
-        result.m_log = ReadText(shader, GL_INFO_LOG_LENGTH, ovo::raw::glGetShaderInfoLog);
+        const CompiledShader result = {compiled == GL_TRUE,
+                                       ReadText(shader, GL_SHADER_SOURCE_LENGTH, ovo::raw::glGetShaderSource),
+                                       ReadText(shader, GL_INFO_LOG_LENGTH, ovo::raw::glGetShaderInfoLog)};
         ovo::raw::glDeleteShader(shader);
         return result;
     }
 
+private:
     // A text whose length, terminator included, `length_name` gives.
     static std::string ReadText(GLuint shader, GLenum length_name,
                                 void (*read)(GLuint, GLsizei, GLsizei*, GLchar*)) {

@@ -1,7 +1,7 @@
 // The ramp, the sprite depth planes and the frame boundary.
-#include "present/matrix4.h"
 #include "present/viewer_tracker.h"
 #include "stereo/draw_call.h"
+#include "stereo/es1_stereo_layer.h"
 #include "stereo/frame_parameters.h"
 #include "stereo/overlay_target.h"
 #include "stereo_fixture.h"
@@ -97,36 +97,43 @@ TEST_F(FrameParametersTest, SpriteDepthPlanesCycleWithTextureChanges) {
     }
 }
 
-TEST_F(FrameParametersTest, TheFrameBoundaryTakesTheViewersEstimateAndRestartsThePlanes) {
-    delete Manager().m_viewer;
-    Manager().m_viewer = new ovo::ViewerTracker(true);
-    // An off-centre frustum, so that the nearest object lies off the eye axis.
-    float projection[16];
-    ovo::Mat4Frustum(projection, -1.0f, 3.0f, -1.0f, 1.0f, 1.0f, 10.0f);
-    float modelview[16];
-    ovo::Mat4Identity(modelview);
-    modelview[14] = -4.0f;
-    Manager().m_viewer->Observe(projection, modelview);
-
-    Manager().m_depth_plane = 3.0f;
-    Manager().m_frame_draws = 17;
-    Manager().m_last_texture = 9;
-    const uint32_t frame = Manager().m_frame_number;
-    ovo::BeginFrame(Manager());
-    // The origin lands at depth 2/3, which unprojects from the screen's centre to
-    // (4, 0, -4): distance 4, angle atan2(4, 4) = 45 degrees.
-    EXPECT_NEAR(Profile().m_eye_distance, 4.0f, 1e-5);
-    EXPECT_NEAR(Profile().m_eye_angle, 45.0f, 1e-4);
-    EXPECT_EQ(Manager().m_depth_plane, -5.0f);
-    EXPECT_EQ(Manager().m_frame_draws, 0u);
-    EXPECT_EQ(Manager().m_last_texture, 0u);
-    EXPECT_EQ(Manager().m_frame_number, frame + 1);
+// An off-centre glFrustumf(-1, 3, -1, 1, 1, 10) and an object 4 in front of the eye, drawn
+// through the OpenGL ES 1.x layer: its origin lands at depth 2/3, which unprojects from the
+// screen's centre to (4, 0, -4), distance 4 and angle 45 degrees. Flat draws show the viewer
+// nothing.
+TEST_F(FrameParametersTest, TheFrameBoundaryTakesTheViewersEstimateOfPerspectiveDrawsAndRestartsThePlanes) {
+    const std::vector<GLfloat> off_centre = {0.5f, 0, 0, 0, 0, 1, 0, 0, 0.5f, 0, -11.0f / 9.0f, -1,
+                                             0, 0, -20.0f / 9.0f, 0};
+    const struct {
+        const std::vector<GLfloat>* m_projection;
+        float m_distance;
+        float m_angle;
+    } cases[] = {{&off_centre, 4.0f, 45.0f}, {&ORTHO, 0.0f, 0.0f}};
+    ovo::Es1StereoLayer layer;
+    Interleave(true);
+    AnswerMatrix(GL_MODELVIEW_MATRIX, {1, 0, 0, 0, 0, 1, 0, 0, 0, 0, 1, 0, 0, 0, -4, 1});
+    for (const auto& each : cases) {
+        delete Manager().m_viewer;
+        Manager().m_viewer = new ovo::ViewerTracker(true);
+        AnswerMatrix(GL_PROJECTION_MATRIX, *each.m_projection);
+        layer.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+        Manager().m_depth_plane = 3.0f;
+        Manager().m_frame_draws = 17;
+        Manager().m_last_texture = 9;
+        const uint32_t frame = Manager().m_frame_number;
+        ovo::BeginFrame(Manager());
+        EXPECT_NEAR(Profile().m_eye_distance, each.m_distance, 1e-5) << &each - cases;
+        EXPECT_NEAR(Profile().m_eye_angle, each.m_angle, 1e-4) << &each - cases;
+        EXPECT_EQ(Manager().m_depth_plane, -5.0f);
+        EXPECT_EQ(Manager().m_frame_draws, 0u);
+        EXPECT_EQ(Manager().m_last_texture, 0u);
+        EXPECT_EQ(Manager().m_frame_number, frame + 1);
+    }
 }
 
 // The overlay collected during the frame goes into it at the mode's size: once, unshifted,
 // without shader conversion; into both halves with it, at the screen's or the target's size.
 TEST_F(FrameParametersTest, TheFrameBoundaryComposesTheOverlayAtTheModesSize) {
-    using Calls = std::vector<std::string>;
     const Calls single = {"glOrthof(0, 1280, 720, 0, -1, 1)", "glViewport(0, 0, 1280, 720)", "glDrawArrays(5, 0, 4)"};
     const struct {
         bool m_shader_convert;

@@ -1,3 +1,6 @@
+// The vertex-shader rewriter: where the two strings land, its trace and hostile sources. Where
+// the leading #version and #extension lines end, for what Mesa cannot show: sources cut short,
+// NULs, names that only begin like a directive's, comments inside a directive's line.
 #include <gtest/gtest.h>
 
 #include <climits>
@@ -5,6 +8,7 @@
 #include <string>
 #include <vector>
 
+#include "stereo/glsl_directives.h"
 #include "stereo/glsl_rewriter.h"
 
 namespace {
@@ -25,8 +29,8 @@ struct Outcome {
 // All of `source`'s bytes are the length; the buffer is exactly the stated room.
 Outcome RunRewrite(const std::string& source, int32_t max_points = 1, const char* pre = PRE,
                    const char* post = POST) {
-    const size_t room = source.size() + (pre ? std::strlen(pre) : 0) +
-                        max_points * (post ? std::strlen(post) : 0) + 1;
+    const size_t room =
+        source.size() + (pre ? std::strlen(pre) : 0) + max_points * (post ? std::strlen(post) : 0) + 1;
     std::vector<char> out(room + GUARD_BYTES, FILL);
     testing::internal::CaptureStdout();
     Outcome outcome;
@@ -34,21 +38,19 @@ Outcome RunRewrite(const std::string& source, int32_t max_points = 1, const char
         ovo::GlslRewriter rewriter;
         rewriter.SetPreString(pre);
         rewriter.SetPostString(post);
-        outcome.m_result = rewriter.Rewrite(out.data(), source.data(),
-                                            static_cast<int32_t>(source.size()), max_points);
+        const int32_t length = static_cast<int32_t>(source.size());
+        outcome.m_result = rewriter.Rewrite(out.data(), source.data(), length, max_points);
     }
     outcome.m_trace = testing::internal::GetCapturedStdout();
     outcome.m_out = outcome.m_result == 1 ? std::string(out.data()) : std::string();
     outcome.m_untouched = std::string(out.begin(), out.end()) == std::string(out.size(), FILL);
-    outcome.m_guard_intact =
-        std::string(out.begin() + room, out.end()) == std::string(GUARD_BYTES, FILL);
+    outcome.m_guard_intact = std::string(out.begin() + room, out.end()) == std::string(GUARD_BYTES, FILL);
     return outcome;
 }
 
 size_t Count(const std::string& text, const std::string& piece) {
     size_t count = 0;
-    for (size_t at = text.find(piece); at != std::string::npos; at = text.find(piece, at + 1))
-        ++count;
+    for (size_t at = text.find(piece); at != std::string::npos; at = text.find(piece, at + 1)) ++count;
     return count;
 }
 
@@ -61,8 +63,7 @@ TEST(GlslRewriter, PlacesBothStrings) {
     } cases[] = {
         {"comments before the version directive",
          "// lead\n/* block */\n#version 100\nattribute vec4 p;\nvoid main() {\n  x = p;\n}\n", 1,
-         "// lead\n/* block */\n<P>#version 100\nattribute vec4 p;\nvoid main() {\n  x = "
-         "p;\n<Q>}\n"},
+         "// lead\n/* block */\n<P>#version 100\nattribute vec4 p;\nvoid main() {\n  x = p;\n<Q>}\n"},
         {"precision first, final brace after a blank",
          "\n  precision mediump float;\nvoid main() { gl_Position = vec4(0.0); }", 1,
          "\n  <P>precision mediump float;\nvoid main() { gl_Position = vec4(0.0); <Q>}"},
@@ -78,31 +79,22 @@ TEST(GlslRewriter, PlacesBothStrings) {
          "<P>void main() { if (c) { <Q>return; } gl_Position = p; <Q>return; }\n"},
         {"last kept return replaced", "void main(){ return; return; return; }", 2,
          "<P>void main(){ <Q>return; return; <Q>return; }"},
-        {"return outside main",
-         "float f() { return 1.0; }\nvoid main() { gl_Position = vec4(f()); }\n", 1,
+        {"return outside main", "float f() { return 1.0; }\nvoid main() { gl_Position = vec4(f()); }\n", 1,
          "<P>float f() { return 1.0; }\nvoid main() { gl_Position = vec4(f()); <Q>}\n"},
         {"main(void)", "void main(void)\n{\n  gl_Position = p;\n}\n", 1,
          "<P>void main(void)\n{\n  gl_Position = p;\n<Q>}\n"},
         {"x.y is one word", "void main(){ v.return; }", 1, "<P>void main(){ v.return; <Q>}"},
-        {"a/b is word, operator, word", "void main(){ v/return; }", 1,
-         "<P>void main(){ v/r<Q>eturn; }"},
+        {"a/b is word, operator, word", "void main(){ v/return; }", 1, "<P>void main(){ v/r<Q>eturn; }"},
         {"leading operator slash", "/a void main(){ }\n", 1, "/a<P> void main(){ <Q>}\n"},
-        {"brace in a string", "void main(){ s = \"}\"; }\n", 1,
-         "<P>void main(){ s = \"}\"; <Q>}\n"},
-        {"brace in a line comment", "void main(){ // }\n x; }\n", 1,
-         "<P>void main(){ // }\n x; <Q>}\n"},
-        {"comment closed by **/", "void main(){ /* a **/ x; }\n", 1,
-         "<P>void main(){ /* a **/ x; <Q>}\n"},
-        {"inner block", "#define X 1\nvoid main(){ { } }", 1,
-         "<P>#define X 1\nvoid main(){ { } <Q>}"},
-        {"terminator counted in the length", std::string("void main(){ }\0", 15), 1,
-         "<P>void main(){ <Q>}"},
-        {"copy stops at a NUL after main", std::string("void main(){ }\0tail", 19), 1,
-         "<P>void main(){ <Q>}"},
+        {"brace in a string", "void main(){ s = \"}\"; }\n", 1, "<P>void main(){ s = \"}\"; <Q>}\n"},
+        {"brace in a line comment", "void main(){ // }\n x; }\n", 1, "<P>void main(){ // }\n x; <Q>}\n"},
+        {"comment closed by **/", "void main(){ /* a **/ x; }\n", 1, "<P>void main(){ /* a **/ x; <Q>}\n"},
+        {"inner block", "#define X 1\nvoid main(){ { } }", 1, "<P>#define X 1\nvoid main(){ { } <Q>}"},
+        {"terminator counted in the length", std::string("void main(){ }\0", 15), 1, "<P>void main(){ <Q>}"},
+        {"copy stops at a NUL after main", std::string("void main(){ }\0tail", 19), 1, "<P>void main(){ <Q>}"},
         {"copy stops at a NUL before main", std::string("uniform vec4 u;\0void main(){ }", 30), 1,
          "<P>uniform vec4 u;"},
-        {"unterminated comment after main", "void main(){ x; } /* open", 1,
-         "<P>void main(){ x; <Q>} /* open"},
+        {"unterminated comment after main", "void main(){ x; } /* open", 1, "<P>void main(){ x; <Q>} /* open"},
     };
     for (const auto& c : cases) {
         const Outcome outcome = RunRewrite(c.source, c.max_points);
@@ -116,16 +108,11 @@ TEST(GlslRewriter, PlacesBothStrings) {
 
 TEST(GlslRewriter, LeavesTheBufferWithoutAnInsertionPoint) {
     const std::string sources[] = {
-        "",
-        "   \n\t",
-        "/* only a comment */ // and another\n",
+        "", "   \n\t", "/* only a comment */ // and another\n",
         "attribute vec4 p;\nvoid other() { gl_Position = p; }\n",
         "void main(){gl_Position=p}",  // the final brace, given back at the end, is never read
-        "void /* x */ main() { }\n",
-        "void main() { gl_Position = p;\n",
-        "void main(){ /* never closed }\n",
-        "void main(){ \"never closed }\n",
-    };
+        "void /* x */ main() { }\n", "void main() { gl_Position = p;\n", "void main(){ /* never closed }\n",
+        "void main(){ \"never closed }\n"};
     for (const std::string& source : sources) {
         const Outcome outcome = RunRewrite(source);
         EXPECT_EQ(outcome.m_result, 0) << source;
@@ -137,8 +124,7 @@ TEST(GlslRewriter, LeavesTheBufferWithoutAnInsertionPoint) {
     EXPECT_EQ(rewriter.Rewrite(out, "void main(){ }", 14, 0), 0);
     EXPECT_EQ(rewriter.Rewrite(out, "void main(){ }", -1, 1), 0);
     EXPECT_EQ(rewriter.Rewrite(out, nullptr, 14, 1), 0);
-    EXPECT_EQ(rewriter.Rewrite(out, "void main(){ }", 13, 1), 0)
-        << "the brace lies past the length";
+    EXPECT_EQ(rewriter.Rewrite(out, "void main(){ }", 13, 1), 0) << "the brace lies past the length";
     EXPECT_STREQ(out, "intact");
 }
 
@@ -188,9 +174,55 @@ TEST(GlslRewriter, RewritesMegabyteSources) {
     EXPECT_EQ(open_comment.m_result, 0);
     EXPECT_TRUE(open_comment.m_untouched);
     // Every kept position fits however many are asked for.
-    const Outcome all_returns =
-        RunRewrite("void main() { return; return; return; }", INT_MAX, PRE, "");
+    const Outcome all_returns = RunRewrite("void main() { return; return; return; }", INT_MAX, PRE, "");
     EXPECT_EQ(Count(all_returns.m_trace, "Last Character"), 3u);
+}
+
+TEST(LeadingDirectivesLength, EndsAfterTheLastVersionOrExtensionLine) {
+    const struct {
+        const char* m_name;
+        std::string m_kept;
+        std::string m_rest;
+    } cases[] = {
+        {"none", "", "attribute vec4 p;\n"},
+        {"a comment alone", "", "// c\nattribute vec4 p;\n"},
+        {"version", "#version 100\n", "attribute vec4 p;\n"},
+        {"blanks around #, CRLF", " \t#\t version 100\r\n#extension A : enable\r\n", "x"},
+        {"CR only", "#version 100\r", "\rx"},
+        {"comments among them", "/* a\n b */\n#version 100\n// c\n\n#extension A : enable\n", "x"},
+        {"a comment over lines in the line", "#version 100 /* a\nb */ c\n", "x"},
+        {"a comment between # and the name", "# /* a\n */ version 100\n", "x"},
+        {"the last line without its end", "#version 100\n#extension A : enable", ""},
+        {"an unterminated comment in the line", "#version 100 /* a\n", ""},
+        {"other directives end them", "#version 100\n", "#define A\n#extension B : enable\n"},
+        {"precision ends them", "#version 100\n", "precision highp float;\n"},
+        {"only the start of a name", "", "#versionx 100\n"},
+        {"a longer name", "#version 100\n", "#extensions A\n"},
+        {"a comment instead of a name", "", "#// version\n#version 100\n"},
+        {"a NUL ends the source", "#version 100\n", std::string("\0#extension A\n", 14)},
+    };
+    for (const auto& each : cases) {
+        // Exactly the source's bytes, no terminator: reading past them is a sanitizer finding.
+        std::vector<char> bytes(each.m_kept.begin(), each.m_kept.end());
+        bytes.insert(bytes.end(), each.m_rest.begin(), each.m_rest.end());
+        EXPECT_EQ(ovo::LeadingDirectivesLength(bytes.data(), static_cast<int32_t>(bytes.size())),
+                  static_cast<int32_t>(each.m_kept.size()))
+            << each.m_name;
+    }
+}
+
+// The source cut at each length: a name cut short is none, a line cut short is kept whole.
+TEST(LeadingDirectivesLength, ASourceCutShortEndsWhereItIsCut) {
+    const std::string source = "#version 100\n#extension A : enable\nx";
+    const struct {
+        int32_t m_length;
+        int32_t m_kept;
+    } cuts[] = {{7, 0}, {8, 8}, {12, 12}, {13, 13}, {22, 13}, {23, 23}, {35, 35}, {36, 35}};
+    for (const auto& cut : cuts) {
+        const std::vector<char> bytes(source.begin(), source.begin() + cut.m_length);
+        EXPECT_EQ(ovo::LeadingDirectivesLength(bytes.data(), cut.m_length), cut.m_kept)
+            << cut.m_length;
+    }
 }
 
 }  // namespace

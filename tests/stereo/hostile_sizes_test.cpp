@@ -1,6 +1,6 @@
-// Sizes and eye parameters at the ends of their ranges: what reaches the vendor is held to
-// the int32 range (NaN as 0), never undefined; values within the range are untouched.
-#include <cstdio>
+// Where each eye lands without interleaving: the halves, the eye order and the rounding. Sizes
+// and eye parameters at the ends of their ranges: what reaches the vendor is held to the int32
+// range (NaN as 0), never undefined; values within the range are untouched.
 #include <limits>
 
 #include "core/saturating_math.h"
@@ -10,87 +10,64 @@
 #include "stereo/es2_scaled_layer.h"
 #include "stereo/es2_stereo_layer.h"
 #include "stereo/eye_viewport.h"
-#include "stereo/gl_object_tracker.h"
 #include "stereo_fixture.h"
 
 namespace {
 
 using namespace recorded_calls;
-using Calls = std::vector<std::string>;
 
 constexpr GLint MAX = std::numeric_limits<GLint>::max();
 constexpr GLint MIN = std::numeric_limits<GLint>::min();
 constexpr float INF = std::numeric_limits<float>::infinity();
 constexpr float NOT_A_NUMBER = std::numeric_limits<float>::quiet_NaN();
 
-std::string RectCall(const char* name, const ovo::GlRect& r) {
-    char text[96];
-    std::snprintf(text, sizeof(text), "%s(%d, %d, %d, %d)", name, r.m_x, r.m_y, r.m_width,
-                  r.m_height);
-    return text;
-}
-
-TEST(SaturatingMath, ConversionsHoldToTheInt32RangeAndTruncateWithinIt) {
-    const std::pair<float, int32_t> truncations[] = {
-        {0.99f, 0}, {-0.99f, 0}, {-59.5f, -59}, {2147483520.0f, 2147483520},
-        {2147483648.0f, MAX}, {-2147483648.0f, MIN}, {-2147483904.0f, MIN}, {3e9f, MAX},
-        {-3e9f, MIN}, {INF, MAX}, {-INF, MIN}, {NOT_A_NUMBER, 0}, {-NOT_A_NUMBER, 0}};
-    for (const auto& [value, expected] : truncations) {
-        EXPECT_EQ(ovo::SaturatingTrunc(value), expected) << value;
-    }
-    struct Pair {
-        int32_t m_a;
-        int32_t m_b;
-        int32_t m_sum;
-        int32_t m_product;
-    } pairs[] = {{-10, -5, -15, 50},     {MAX, 1, MAX, MAX},        {MIN, -1, MIN, MAX},
-                 {MAX, MIN, -1, MIN},    {MAX / 2, 2, MAX / 2 + 2, MAX - 1},
-                 {MAX / 2 + 1, 2, MAX / 2 + 3, MAX}, {MIN / 2, 2, MIN / 2 + 2, MIN},
-                 {MIN / 2 - 1, 2, MIN / 2 + 1, MIN}, {MIN, MIN, MIN, MAX}};
-    for (const Pair& each : pairs) {
-        EXPECT_EQ(ovo::SaturatingAdd(each.m_a, each.m_b), each.m_sum) << each.m_a << " + " << each.m_b;
-        EXPECT_EQ(ovo::SaturatingMul(each.m_a, each.m_b), each.m_product) << each.m_a << " * " << each.m_b;
-    }
-}
-
-class HostileSizesTest : public StereoFixture {
+class EyeViewportTest : public StereoFixture {
 protected:
-    void SetUp() override {
-        StereoFixture::SetUp();
-        Interleave(false);
-    }
-
-    // An OpenGL ES 2.0 context; the tracked layer's objects start unbound.
-    void UseEs2() {
-        ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
-        Manager().m_objects->m_current_framebuffer = 0;
-        Manager().m_objects->m_current_texture = 0;
+    static Calls BothEyes(float scale_x = 1.5f, float scale_y = 1.25f) {
         ResetRecorder();
+        ovo::ApplyEyeViewport(Manager(), 0, scale_x, scale_y);
+        ovo::ApplyEyeViewport(Manager(), 1, scale_x, scale_y);
+        return recorded_calls::RecordedGlCalls();
     }
-
-    // Texture 5, `width` x 64, attached to framebuffer 3, which stays bound.
-    void MakeRenderTexture(GLsizei width) {
-        m_tracked.glBindTexture(Manager(), GL_TEXTURE_2D, 5);
-        m_tracked.glTexImage2D(Manager(), GL_TEXTURE_2D, 0, GL_RGBA, width, 64, 0, GL_RGBA,
-                               GL_UNSIGNED_BYTE, nullptr);
-        m_tracked.glBindFramebuffer(Manager(), GL_FRAMEBUFFER, 3);
-        m_tracked.glFramebufferTexture2D(Manager(), GL_FRAMEBUFFER, GL_COLOR_ATTACHMENT0,
-                                         GL_TEXTURE_2D, 5, 0);
-    }
-
-    // A plain-mode profile of the screen size 800 x 480 and the given target size.
-    static void PlainProfile(int32_t target_width, int32_t target_height) {
-        Profile().m_width = 800;
-        Profile().m_height = 480;
-        Profile().m_target_width = target_width;
-        Profile().m_target_height = target_height;
-        Manager().UpdateScale();
-    }
-
-    ovo::Es2StereoLayer m_tracked{ovo::LAYER_SUBMODE_TRACKED};
 };
 
-TEST_F(HostileSizesTest, EyeViewportsOfExtremeRectanglesAndScalesSaturate) {
+// An unknown eye order is the normal one; an unknown split places nothing. Interleaving leaves
+// viewport and scissor to the mask.
+TEST_F(EyeViewportTest, EachSplitAndEyeOrderPutsTheEyesInTheirHalves) {
+    // The rectangles of the eye drawn into the left (upper) half and of the other one.
+    const Calls side_first(SCALED_HALVES.begin(), SCALED_HALVES.begin() + 2);
+    const Calls side_other(SCALED_HALVES.begin() + 2, SCALED_HALVES.end());
+    const Calls top_first = {"glViewport(15, 252, 601, 152)", "glScissor(6, 243, 151, 32)"};
+    const Calls top_other = {"glViewport(15, 12, 601, 152)", "glScissor(6, 3, 151, 32)"};
+    const struct {
+        uint32_t m_split;
+        uint32_t m_eye_order;
+        Calls m_expected;
+    } cases[] = {
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, ovo::STEREO_EYE_ORDER_NORMAL, Join({side_first, side_other})},
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, ovo::STEREO_EYE_ORDER_SWAPPED, Join({side_other, side_first})},
+        {ovo::STEREO_SPLIT_SIDE_BY_SIDE, 0x1234, Join({side_first, side_other})},
+        {ovo::STEREO_SPLIT_TOP_BOTTOM, ovo::STEREO_EYE_ORDER_NORMAL, Join({top_first, top_other})},
+        {ovo::STEREO_SPLIT_TOP_BOTTOM, ovo::STEREO_EYE_ORDER_SWAPPED, Join({top_other, top_first})},
+        {ovo::STEREO_SPLIT_TOP_BOTTOM, 0x1234, Join({top_first, top_other})},
+        {0x3999, ovo::STEREO_EYE_ORDER_NORMAL, Calls()},
+    };
+    Interleave(false);
+    ScaleOutput();
+    for (const auto& each : cases) {
+        Profile().m_split = each.m_split;
+        Profile().m_eye_order = each.m_eye_order;
+        EXPECT_EQ(BothEyes(), each.m_expected) << std::hex << each.m_split << " " << each.m_eye_order;
+    }
+    Profile().m_split = ovo::STEREO_SPLIT_SIDE_BY_SIDE;
+    Interleave(true);
+    EXPECT_EQ(BothEyes(), Calls());
+    ResetRecorder();
+    ovo::ApplyScaledViewport(Manager(), 1.5f, 1.25f);
+    EXPECT_EQ(recorded_calls::RecordedGlCalls(), Calls());
+}
+
+TEST_F(EyeViewportTest, EyeViewportsOfExtremeRectanglesAndScalesSaturate) {
     struct Case {
         uint32_t m_split;
         ovo::GlRect m_rect;
@@ -113,89 +90,107 @@ TEST_F(HostileSizesTest, EyeViewportsOfExtremeRectanglesAndScalesSaturate) {
         {ovo::STEREO_SPLIT_TOP_BOTTOM, {MIN, MIN, MIN, MIN}, 2, 4, {MIN, MIN, MIN, MIN}, {MIN, MIN, MIN, MIN}},
         {ovo::STEREO_SPLIT_TOP_BOTTOM, {-10, -20, -30, -40}, 2, 4, {-20, 200, -60, -79}, {-20, -40, -60, -79}},
     };
+    Interleave(false);
     Profile().m_eye_order = ovo::STEREO_EYE_ORDER_NORMAL;
     for (const Case& each : cases) {
         Profile().m_split = each.m_split;
         const ovo::GlRect& r = each.m_rect;
         glViewport(r.m_x, r.m_y, r.m_width, r.m_height);
         glScissor(r.m_x, r.m_y, r.m_width, r.m_height);
-        ResetRecorder();
-        ovo::ApplyEyeViewport(Manager(), 0, each.m_scale_x, each.m_scale_y);
-        ovo::ApplyEyeViewport(Manager(), 1, each.m_scale_x, each.m_scale_y);
         const Calls expected = {RectCall("glViewport", each.m_first), RectCall("glScissor", each.m_first),
                                 RectCall("glViewport", each.m_other), RectCall("glScissor", each.m_other)};
-        EXPECT_EQ(RecordedGlCalls(), expected)
-            << std::hex << each.m_split << std::dec << " " << RectCall("rect", r) << " scale "
-            << each.m_scale_x;
+        EXPECT_EQ(BothEyes(each.m_scale_x, each.m_scale_y), expected)
+            << std::hex << each.m_split << std::dec << " " << RectCall("rect", r) << " scale " << each.m_scale_x;
     }
 }
 
-// Without a target size the scale is infinite (screen size / 0) or NaN (0 / 0).
-struct PlainCase {
-    int32_t m_target_width;
-    int32_t m_target_height;
-    ovo::GlRect m_viewport;
-    ovo::GlRect m_scissor;
-    ovo::GlRect m_scaled_viewport;
-    ovo::GlRect m_scaled_scissor;
-};
-const PlainCase PLAIN_CASES[] = {
-    {0, 0, {10, 20, 401, 243}, {0, 0, 800, 480}, {MAX, MAX, MAX, MAX}, {0, 0, MAX, MAX}},
-    {0, 0, {-10, 0, 0, 243}, {MIN, MAX, -1, 1}, {MIN, 0, 0, MAX}, {MIN, MAX, MIN, MAX}},
-    {0, 480, {10, 20, 401, 243}, {-4, 6, 101, 51}, {MAX, 20, MAX, 243}, {MIN, 6, MAX, 51}},
+TEST(SaturatingMath, ConversionsHoldToTheInt32RangeAndTruncateWithinIt) {
+    const std::pair<float, int32_t> truncations[] = {
+        {0.99f, 0},  {-0.99f, 0}, {-59.5f, -59}, {2147483520.0f, 2147483520}, {2147483648.0f, MAX},
+        {-2147483648.0f, MIN}, {-2147483904.0f, MIN}, {3e9f, MAX}, {-3e9f, MIN}, {INF, MAX}, {-INF, MIN},
+        {NOT_A_NUMBER, 0}, {-NOT_A_NUMBER, 0}};
+    for (const auto& [value, expected] : truncations) {
+        EXPECT_EQ(ovo::SaturatingTrunc(value), expected) << value;
+    }
+    struct Pair {
+        int32_t m_a;
+        int32_t m_b;
+        int32_t m_sum;
+        int32_t m_product;
+    } pairs[] = {{-10, -5, -15, 50}, {MAX, 1, MAX, MAX}, {MIN, -1, MIN, MAX}, {MAX, MIN, -1, MIN},
+                 {MAX / 2, 2, MAX / 2 + 2, MAX - 1}, {MAX / 2 + 1, 2, MAX / 2 + 3, MAX},
+                 {MIN / 2, 2, MIN / 2 + 2, MIN}, {MIN / 2 - 1, 2, MIN / 2 + 1, MIN}, {MIN, MIN, MIN, MAX}};
+    for (const Pair& each : pairs) {
+        EXPECT_EQ(ovo::SaturatingAdd(each.m_a, each.m_b), each.m_sum) << each.m_a << " + " << each.m_b;
+        EXPECT_EQ(ovo::SaturatingMul(each.m_a, each.m_b), each.m_product) << each.m_a << " * " << each.m_b;
+    }
+}
+
+class HostileSizesTest : public StereoFixture {
+protected:
+    void SetUp() override {
+        StereoFixture::SetUp();
+        Interleave(false);
+    }
+
+    ovo::Es2StereoLayer m_tracked{ovo::LAYER_SUBMODE_TRACKED};
 };
 
+// Without a target size (screen 800 x 480) the scale is infinite (screen size / 0) or NaN (0 / 0).
 TEST_F(HostileSizesTest, PlainModeWithoutATargetSizeSaturatesTheScaledRectangles) {
+    const struct {
+        int32_t m_target_width;
+        int32_t m_target_height;
+        ovo::GlRect m_viewport;
+        ovo::GlRect m_scissor;
+        ovo::GlRect m_scaled_viewport;
+        ovo::GlRect m_scaled_scissor;
+    } cases[] = {
+        {0, 0, {10, 20, 401, 243}, {0, 0, 800, 480}, {MAX, MAX, MAX, MAX}, {0, 0, MAX, MAX}},
+        {0, 0, {-10, 0, 0, 243}, {MIN, MAX, -1, 1}, {MIN, 0, 0, MAX}, {MIN, MAX, MIN, MAX}},
+        {0, 480, {10, 20, 401, 243}, {-4, 6, 101, 51}, {MAX, 20, MAX, 243}, {MIN, 6, MAX, 51}},
+    };
     ovo::Es1ScaledLayer es1;
-    AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
-    for (const PlainCase& each : PLAIN_CASES) {
-        PlainProfile(each.m_target_width, each.m_target_height);
-        Manager().m_viewport = each.m_viewport;
-        Manager().m_scissor = each.m_scissor;
-        ResetRecorder();
-        es1.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(Only({"glViewport", "glScissor"}),
-                  (Calls{RectCall("glViewport", each.m_scaled_viewport),
-                         RectCall("glScissor", each.m_scaled_scissor)}))
-            << RectCall("viewport", each.m_viewport);
-    }
-    UseEs2();
     ovo::Es2ScaledLayer es2;
-    for (const PlainCase& each : PLAIN_CASES) {
-        PlainProfile(each.m_target_width, each.m_target_height);
-        Manager().m_viewport = each.m_viewport;
-        Manager().m_scissor = each.m_scissor;
-        ResetRecorder();
-        es2.glClear(Manager(), GL_COLOR_BUFFER_BIT);
-        es2.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(Only({"glViewport", "glScissor"}),
-                  (Calls{RectCall("glScissor", each.m_scaled_scissor),
-                         RectCall("glViewport", each.m_scaled_viewport)}))
-            << RectCall("viewport", each.m_viewport);
+    AnswerMatrix(GL_PROJECTION_MATRIX, PERSPECTIVE);
+    for (ovo::GlLayer* layer : {static_cast<ovo::GlLayer*>(&es1), static_cast<ovo::GlLayer*>(&es2)}) {
+        if (layer == &es2) UseEs2();
+        for (const auto& each : cases) {
+            Profile().m_target_width = each.m_target_width;
+            Profile().m_target_height = each.m_target_height;
+            Manager().UpdateScale();
+            Manager().m_viewport = each.m_viewport;
+            Manager().m_scissor = each.m_scissor;
+            ResetRecorder();
+            // The OpenGL ES 2.0 layer scales the scissor of its clears.
+            if (layer == &es2) layer->glClear(Manager(), GL_COLOR_BUFFER_BIT);
+            layer->glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
+            const std::string viewport = RectCall("glViewport", each.m_scaled_viewport);
+            const std::string scissor = RectCall("glScissor", each.m_scaled_scissor);
+            const Calls expected = layer == &es1 ? Calls{viewport, scissor} : Calls{scissor, viewport};
+            EXPECT_EQ(Only({"glViewport", "glScissor"}), expected) << RectCall("viewport", each.m_viewport);
+        }
     }
 }
 
 TEST_F(HostileSizesTest, TrackedDoubleWidthsHoldAtTheInt32Range) {
     UseEs2();
     const std::pair<GLsizei, GLsizei> widths[] = {
-        {128, 256},         {0, 0},           {-5, -10},          {1073741823, MAX - 1},
-        {1073741824, MAX},  {MAX, MAX},       {-1073741824, MIN}, {-1073741825, MIN},
-        {MIN, MIN}};
+        {128, 256}, {0, 0}, {-5, -10}, {1073741823, MAX - 1}, {1073741824, MAX}, {MAX, MAX},
+        {-1073741824, MIN}, {-1073741825, MIN}, {MIN, MIN}};
     for (const auto& [width, doubled] : widths) {
         Profile().m_width = width;
         ResetRecorder();
         m_tracked.glClear(Manager(), GL_COLOR_BUFFER_BIT);
         m_tracked.glRenderbufferStorage(Manager(), GL_RENDERBUFFER, GL_DEPTH_COMPONENT16, width, 64);
         const std::string d = std::to_string(doubled);
-        EXPECT_EQ(RecordedGlCalls(),
-                  (Calls{"glScissor(0, 0, " + d + ", 480)", "glClear(0x4000)",
-                         "glRenderbufferStorage(0x8D41, 0x81A5, " + d + ", 64)"}))
+        EXPECT_EQ(RecordedGlCalls(), (Calls{"glScissor(0, 0, " + d + ", 480)", "glClear(0x4000)",
+                                            "glRenderbufferStorage(0x8D41, 0x81A5, " + d + ", 64)"}))
             << width;
 
         ResetRecorder();
-        MakeRenderTexture(width);
-        Calls images = {"glTexImage2D(0x0DE1, 0, 6408, " + std::to_string(width) +
-                        ", 64, 0, 0x1908, 0x1401, null)"};
+        MakeRenderTexture(m_tracked, width);
+        Calls images = {"glTexImage2D(0x0DE1, 0, 6408, " + std::to_string(width) + ", 64, 0, 0x1908, 0x1401, null)"};
         // A texture without a width is never specified again.
         if (width != 0) images.push_back("glTexImage2D(0x0DE1, 0, 6408, " + d + ", 64, 0, 0x1908, 0x1401, null)");
         EXPECT_EQ(Only({"glTexImage2D"}), images) << width;
@@ -208,14 +203,12 @@ TEST_F(HostileSizesTest, TheSecondEyeOfADoubleWidthDrawSaturates) {
         GLint m_x;
         GLsizei m_texture_width;
         GLint m_second_x;
-    } cases[] = {{0, 128, 128},   {-10, -5, -15},   {MAX, 128, MAX},   {10, MAX, MAX},
-                 {MIN, -1, MIN},  {-10, MIN, MIN},  {MAX, MIN, -1}};
+    } cases[] = {{0, 128, 128}, {-10, -5, -15}, {MAX, 128, MAX}, {10, MAX, MAX},
+                 {MIN, -1, MIN}, {-10, MIN, MIN}, {MAX, MIN, -1}};
     for (const Case& each : cases) {
-        MakeRenderTexture(each.m_texture_width);
+        MakeRenderTexture(m_tracked, each.m_texture_width);
         Manager().m_viewport = {each.m_x, 0, 128, 64};
-        ResetRecorder();
-        m_tracked.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(Only({"glViewport"}), (Calls{RectCall("glViewport", {each.m_x, 0, 128, 64}),
+        EXPECT_EQ(Drawn(m_tracked, {"glViewport"}), (Calls{RectCall("glViewport", {each.m_x, 0, 128, 64}),
                                                RectCall("glViewport", {each.m_second_x, 0, 128, 64})}))
             << each.m_x << " + " << each.m_texture_width;
     }
@@ -241,9 +234,7 @@ TEST_F(HostileSizesTest, SpriteShiftsOfExtremeEyeDistancesSaturate) {
     for (const Case& each : cases) {
         glTexParameterf(ovo::STEREO_PARAM_EYE_DISTANCE, GL_TEXTURE_MIN_FILTER, each.m_distance);
         Manager().m_depth_plane = -5.0f;
-        ResetRecorder();
-        sprites.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-        EXPECT_EQ(Only({"glTranslatef"}), (Calls{each.m_first, each.m_other})) << each.m_distance;
+        EXPECT_EQ(Drawn(sprites, {"glTranslatef"}), (Calls{each.m_first, each.m_other})) << each.m_distance;
     }
 }
 

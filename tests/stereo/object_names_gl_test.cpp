@@ -22,14 +22,8 @@ std::string ColourAt(GLint x, GLint y) {
     GLubyte pixel[4] = {1, 2, 3, 4};
     ovo::raw::glReadPixels(x, y, 1, 1, GL_RGBA, GL_UNSIGNED_BYTE, pixel);
     if (pixel[0] == 1 && pixel[1] == 2 && pixel[2] == 3 && pixel[3] == 4) return "-";
-    const int bits = (pixel[0] > 127 ? 1 : 0) | (pixel[1] > 127 ? 2 : 0) | (pixel[2] > 127 ? 4 : 0);
-    switch (bits) {
-        case 0: return "black";
-        case 1: return "red";
-        case 2: return "green";
-        case 4: return "blue";
-        default: return "other";
-    }
+    static const char* const NAMES[] = {"black", "red", "green", "other", "blue", "other", "other", "other"};
+    return NAMES[(pixel[0] > 127 ? 1 : 0) | (pixel[1] > 127 ? 2 : 0) | (pixel[2] > 127 ? 4 : 0)];
 }
 
 constexpr GLsizei SURFACE_SIZE = 16;

@@ -7,7 +7,6 @@
 namespace {
 
 using namespace recorded_calls;
-using Calls = std::vector<std::string>;
 
 class OverlayTargetTest : public StereoFixture {
 protected:
@@ -34,10 +33,9 @@ TEST_F(OverlayTargetTest, CreateMakesTheTextureAndFramebufferOnce) {
     const Calls expected = {
         "glBindTexture(0x0DE1, 0xFFFF)", "glTexImage2D(0x0DE1, 0, 6408, 1280, 720, 0, 0x1908, 0x1401, null)",
         "glTexParameterf(0x0DE1, 0x2802, 33071)", "glTexParameterf(0x0DE1, 0x2803, 33071)",
-        "glTexParameterf(0x0DE1, 0x2800, 9729)", "glTexParameterf(0x0DE1, 0x2801, 9729)",
-        "glBindTexture(0x0DE1, 0)", "glGetIntegerv(0x8CA6, ptr)", "glGenFramebuffersOES(1, ptr)",
-        "glBindFramebufferOES(0x8D40, 7)", "glFramebufferTexture2DOES(0x8D40, 0x8CE0, 0x0DE1, 0xFFFF, 0)",
-        "glBindFramebufferOES(0x8D40, 3)"};
+        "glTexParameterf(0x0DE1, 0x2800, 9729)", "glTexParameterf(0x0DE1, 0x2801, 9729)", "glBindTexture(0x0DE1, 0)",
+        "glGetIntegerv(0x8CA6, ptr)", "glGenFramebuffersOES(1, ptr)", "glBindFramebufferOES(0x8D40, 7)",
+        "glFramebufferTexture2DOES(0x8D40, 0x8CE0, 0x0DE1, 0xFFFF, 0)", "glBindFramebufferOES(0x8D40, 3)"};
     EXPECT_EQ(RecordedGlCalls(), expected);
     EXPECT_EQ(m_overlay.BoundFramebuffer(), 0u);
 }
@@ -58,27 +56,21 @@ TEST_F(OverlayTargetTest, ARepeatedReleaseDeletesNothingTwice) {
     EXPECT_EQ(m_overlay.Framebuffer(), 7u);
 }
 
-// With the application's own framebuffer bound, overlay draws go there.
-TEST_F(OverlayTargetTest, DrawsKeepTheApplicationsFramebuffer) {
+// With the application's own framebuffer bound, overlay draws go there; a clear empties the
+// overlay and keeps the binding the application believes in.
+TEST_F(OverlayTargetTest, DrawsAndClearsKeepTheApplicationsFramebuffer) {
     m_overlay.Create();
     m_overlay.SetBoundFramebuffer(5);
     ResetRecorder();
     m_overlay.DrawInto(Manager(), ovo::DrawCall::Arrays(GL_TRIANGLES, 0, 3));
-    EXPECT_EQ(RecordedGlCalls(), (Calls{"glViewport(0, 0, 800, 480)", "glScissor(0, 0, 800, 480)",
-                                        "glDrawArrays(4, 0, 3)"}));
-    EXPECT_EQ(m_overlay.BoundFramebuffer(), 5u);
-}
-
-TEST_F(OverlayTargetTest, ClearKeepsTheBindingTheApplicationBelievesIn) {
-    m_overlay.Create();
-    m_overlay.SetBoundFramebuffer(5);
+    EXPECT_EQ(RecordedGlCalls(),
+              (Calls{"glViewport(0, 0, 800, 480)", "glScissor(0, 0, 800, 480)", "glDrawArrays(4, 0, 3)"}));
     ResetRecorder();
     m_overlay.Clear();
-    const Calls expected = {"glBindFramebufferOES(0x8D40, 7)", "glViewport(0, 0, 800, 480)",
-                            "glScissor(0, 0, 800, 480)", "glGetFloatv(0x0C22, ptr)",
-                            "glGetFloatv(0x0B73, ptr)", "glClearColor(0, 0, 0, 0)",
-                            "glClearDepthf(1)", "glClear(0x4100)", "glClearColor(0, 0, 0, 0)",
-                            "glClearDepthf(1)", "glBindFramebufferOES(0x8D40, 5)"};
+    const Calls expected = {
+        "glBindFramebufferOES(0x8D40, 7)", "glViewport(0, 0, 800, 480)", "glScissor(0, 0, 800, 480)",
+        "glGetFloatv(0x0C22, ptr)", "glGetFloatv(0x0B73, ptr)", "glClearColor(0, 0, 0, 0)", "glClearDepthf(1)",
+        "glClear(0x4100)", "glClearColor(0, 0, 0, 0)", "glClearDepthf(1)", "glBindFramebufferOES(0x8D40, 5)"};
     EXPECT_EQ(RecordedGlCalls(), expected);
     EXPECT_EQ(m_overlay.BoundFramebuffer(), 5u);
 }
@@ -95,40 +87,34 @@ TEST_F(OverlayTargetTest, FlushComposesPendingContentIntoBothHalvesAndPutsStateB
     // matrices pushed, texture set up, alpha test saved and set, the quads, the matrices
     // popped, then put back in its own order; then the overlay is emptied.
     const Calls expected = {
-        "glBindFramebufferOES", "glGetBooleanv", "glColorMask", "glGetBooleanv", "glDepthMask",
-        "glGetIntegerv", "glGetIntegerv", "glGetIntegerv", "glGetIntegerv", "glIsEnabled",
-        "glIsEnabled", "glIsEnabled", "glIsEnabled", "glGetIntegerv", "glGetTexEnviv",
-        "glGetIntegerv", "glIsEnabled", "glIsEnabled", "glIsEnabled", "glIsEnabled", "glEnable",
-        "glGetIntegerv", "glCullFace", "glGetIntegerv", "glFrontFace", "glGetIntegerv",
-        "glGetIntegerv", "glGetIntegerv", "glGetPointerv", "glGetIntegerv", "glGetIntegerv",
-        "glGetIntegerv", "glGetPointerv", "glMatrixMode", "glPushMatrix", "glLoadIdentity",
-        "glOrthof", "glMatrixMode", "glPushMatrix", "glLoadIdentity", "glMatrixMode",
-        "glPushMatrix", "glLoadIdentity", "glBindTexture", "glBindBuffer", "glTexParameterf",
-        "glTexParameterf", "glTexParameterf", "glTexParameterf", "glTexEnvf", "glDisable",
-        "glEnable", "glEnable", "glBlendFunc", "glIsEnabled", "glGetIntegerv", "glGetFloatv",
-        "glDisable", "glAlphaFunc", "glDisable", "glTexCoordPointer", "glEnableClientState",
-        "glVertexPointer", "glEnableClientState", "glDisableClientState", "glViewport",
-        "glScissor", "glDrawArrays", "glViewport", "glScissor", "glDrawArrays", "glMatrixMode",
-        "glPopMatrix", "glMatrixMode", "glPopMatrix", "glMatrixMode", "glPopMatrix",
-        // put back: alpha test and function, four enables, matrix mode, viewport, blend
-        // function, texture, environment, array buffer, three client arrays, cull face,
-        // cull mode, front face, the two pointers, depth mask, colour mask
-        "glEnable", "glAlphaFunc", "glEnable", "glEnable", "glEnable", "glEnable",
-        "glMatrixMode", "glViewport", "glBlendFunc", "glBindTexture", "glTexEnvi",
-        "glBindBuffer", "glEnableClientState", "glEnableClientState", "glEnableClientState",
-        "glEnable", "glCullFace", "glFrontFace", "glVertexPointer", "glTexCoordPointer",
+        "glBindFramebufferOES", "glGetBooleanv", "glColorMask", "glGetBooleanv", "glDepthMask", "glGetIntegerv",
+        "glGetIntegerv", "glGetIntegerv", "glGetIntegerv", "glIsEnabled", "glIsEnabled", "glIsEnabled",
+        "glIsEnabled", "glGetIntegerv", "glGetTexEnviv", "glGetIntegerv", "glIsEnabled", "glIsEnabled",
+        "glIsEnabled", "glIsEnabled", "glEnable", "glGetIntegerv", "glCullFace", "glGetIntegerv", "glFrontFace",
+        "glGetIntegerv", "glGetIntegerv", "glGetIntegerv", "glGetPointerv", "glGetIntegerv", "glGetIntegerv",
+        "glGetIntegerv", "glGetPointerv", "glMatrixMode", "glPushMatrix", "glLoadIdentity", "glOrthof",
+        "glMatrixMode", "glPushMatrix", "glLoadIdentity", "glMatrixMode", "glPushMatrix", "glLoadIdentity",
+        "glBindTexture", "glBindBuffer", "glTexParameterf", "glTexParameterf", "glTexParameterf",
+        "glTexParameterf", "glTexEnvf", "glDisable", "glEnable", "glEnable", "glBlendFunc", "glIsEnabled",
+        "glGetIntegerv", "glGetFloatv", "glDisable", "glAlphaFunc", "glDisable", "glTexCoordPointer",
+        "glEnableClientState", "glVertexPointer", "glEnableClientState", "glDisableClientState", "glViewport",
+        "glScissor", "glDrawArrays", "glViewport", "glScissor", "glDrawArrays", "glMatrixMode", "glPopMatrix",
+        "glMatrixMode", "glPopMatrix", "glMatrixMode", "glPopMatrix",
+        // put back: alpha test and function, four enables, matrix mode, viewport, blend function,
+        // texture, environment, array buffer, three client arrays, cull face, cull mode, front
+        // face, the two pointers, depth mask, colour mask
+        "glEnable", "glAlphaFunc", "glEnable", "glEnable", "glEnable", "glEnable", "glMatrixMode", "glViewport",
+        "glBlendFunc", "glBindTexture", "glTexEnvi", "glBindBuffer", "glEnableClientState", "glEnableClientState",
+        "glEnableClientState", "glEnable", "glCullFace", "glFrontFace", "glVertexPointer", "glTexCoordPointer",
         "glDepthMask", "glColorMask",
         // Clear
-        "glBindFramebufferOES", "glViewport", "glScissor", "glGetFloatv", "glGetFloatv",
-        "glClearColor", "glClearDepthf", "glClear", "glClearColor", "glClearDepthf",
-        "glBindFramebufferOES"};
+        "glBindFramebufferOES", "glViewport", "glScissor", "glGetFloatv", "glGetFloatv", "glClearColor",
+        "glClearDepthf", "glClear", "glClearColor", "glClearDepthf", "glBindFramebufferOES"};
     EXPECT_EQ(Names(calls), expected);
     // Two side-by-side halves of 640 x 720, and the overlay is empty afterwards.
-    const Calls quads = {"glViewport(0, 0, 640, 720)", "glScissor(0, 0, 640, 720)",
-                         "glViewport(640, 0, 640, 720)", "glScissor(640, 0, 640, 720)"};
     EXPECT_EQ(Calls(calls.begin() + 65, calls.begin() + 71),
-              (Calls{quads[0], quads[1], "glDrawArrays(5, 0, 4)", quads[2], quads[3],
-                     "glDrawArrays(5, 0, 4)"}));
+              (Calls{"glViewport(0, 0, 640, 720)", "glScissor(0, 0, 640, 720)", "glDrawArrays(5, 0, 4)",
+                     "glViewport(640, 0, 640, 720)", "glScissor(640, 0, 640, 720)", "glDrawArrays(5, 0, 4)"}));
     EXPECT_EQ(calls[1 + 35], "glOrthof(0, 640, 720, 0, -1, 1)");
     EXPECT_EQ(calls[53], "glBlendFunc(1, 0x0303)") << "the overlay holds premultiplied colour";
     EXPECT_FALSE(m_overlay.HasContent());

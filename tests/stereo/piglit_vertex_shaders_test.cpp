@@ -56,8 +56,7 @@ std::string Field(const std::string& text, const std::string& key) {
 
 // Each [vertex shader] section as shader_runner submits it: a `#version 100` line in front
 // when the section has no #version of its own (the GLSL ES version the test requires).
-void AddSections(const std::string& name, const std::string& text,
-                 std::vector<CorpusShader>* corpus) {
+void AddSections(const std::string& name, const std::string& text, std::vector<CorpusShader>* corpus) {
     const std::string header = "[vertex shader]\n";
     int number = 0;
     for (size_t at = text.find(header); at != std::string::npos; at = text.find(header, at + 1)) {
@@ -68,8 +67,7 @@ void AddSections(const std::string& name, const std::string& text,
         const std::string section = text.substr(begin, end - begin);
         CorpusShader shader{name + " [vertex shader " + std::to_string(++number) + "]", {}, "pass"};
         if (section.find("#version ") == std::string::npos) {
-            EXPECT_NE(text.find("\nGLSL ES >= 1.00\n"), std::string::npos)
-                << name << ": requires another GLSL ES version";
+            EXPECT_NE(text.find("\nGLSL ES >= 1.00\n"), std::string::npos) << name << ": wants another GLSL ES";
             shader.m_strings.push_back("#version 100\n");
         }
         shader.m_strings.push_back(section);
@@ -82,8 +80,7 @@ void AddSections(const std::string& name, const std::string& text,
 std::vector<CorpusShader> ReadCorpus(int* sections) {
     std::vector<fs::path> paths;
     std::error_code error;
-    for (fs::recursive_directory_iterator it(PIGLIT_TESTS, error), end;
-         !error && it != end; it.increment(error)) {
+    for (fs::recursive_directory_iterator it(PIGLIT_TESTS, error), end; !error && it != end; it.increment(error)) {
         if (it->is_regular_file()) paths.push_back(it->path());
     }
     EXPECT_FALSE(error) << PIGLIT_TESTS << ": " << error.message();
@@ -98,8 +95,7 @@ std::vector<CorpusShader> ReadCorpus(int* sections) {
             const size_t before = corpus.size();
             AddSections(name, text, &corpus);
             *sections += static_cast<int>(corpus.size() - before);
-        } else if (path.extension() == ".vert" &&
-                   (es_100 || Field(text, "glsl_version") == "1.00")) {
+        } else if (path.extension() == ".vert" && (es_100 || Field(text, "glsl_version") == "1.00")) {
             corpus.push_back({name, {text}, Field(text, "expect_result")});
         }
     }
@@ -134,8 +130,8 @@ bool DefinesMain(const std::string& bare) {
 // The declaration stands right in front of the first thing that is neither blank, comment
 // nor a #version or #extension line; the rest is the application's text with the statement
 // added once.
-void ExpectDeclarationAfterTheDirectives(const std::string& name, const std::string& written,
-                                         const std::string& injected) {
+void ExpectDeclarationAfterDirectives(const std::string& name, const std::string& written,
+                                      const std::string& injected) {
     const std::string declaration = ovo::DEPTH_SHIFT_DECLARATION;
     const size_t at = injected.find(declaration);
     ASSERT_NE(at, std::string::npos) << name << ": nothing injected";
@@ -161,13 +157,6 @@ void ExpectDeclarationAfterTheDirectives(const std::string& name, const std::str
     EXPECT_EQ(rest, written) << name;
 }
 
-const Exception* ExceptionFor(const std::string& name) {
-    for (const Exception& exception : EXCEPTIONS) {
-        if (name == exception.m_name) return &exception;
-    }
-    return nullptr;
-}
-
 TEST_F(DepthShiftOnMesa, PiglitGlslEs100VertexShadersStillCompileWithTheDeclarationAfterTheirDirectives) {
     ASSERT_TRUE(fs::is_directory(PIGLIT_TESTS / ES_100_FOLDER))
         << PIGLIT_TESTS << " holds no piglit corpus: the test PiglitCorpus.Fetch "
@@ -187,28 +176,28 @@ TEST_F(DepthShiftOnMesa, PiglitGlslEs100VertexShadersStillCompileWithTheDeclarat
             strings.push_back(each.c_str());
             written += each;
         }
-        const CompiledShader as_written = CompileNatively(GL_VERTEX_SHADER, strings);
+        const CompiledShader as_written = Compile(GL_VERTEX_SHADER, strings, false);
         if (!as_written.m_compiled) {
             left_out.push_back(shader.m_name + " (expect_result: " + shader.m_expect_result + ")");
             left_out_expected += shader.m_expect_result == "fail" ? 1 : 0;
             continue;
         }
         native += 1;
-        const CompiledShader result = SetAndCompile(GL_VERTEX_SHADER, strings);
-        const Exception* exception = ExceptionFor(shader.m_name);
-        if (exception != nullptr) {
-            met.push_back(exception);
+        const CompiledShader result = Compile(GL_VERTEX_SHADER, strings);
+        const auto exception = std::find_if(EXCEPTIONS.begin(), EXCEPTIONS.end(),
+                                            [&](const Exception& each) { return shader.m_name == each.m_name; });
+        if (exception != EXCEPTIONS.end()) {
+            met.push_back(&*exception);
             EXPECT_FALSE(result.m_compiled) << shader.m_name << " is listed as failing, but compiles";
             EXPECT_NE(result.m_log.find(exception->m_log), std::string::npos)
                 << shader.m_name << " fails otherwise than listed (" << exception->m_reason
                 << "):\n" << result.m_log;
             continue;
         }
-        EXPECT_TRUE(result.m_compiled) << shader.m_name << ":\n" << result.m_log << "\n"
-                                       << result.m_source;
+        EXPECT_TRUE(result.m_compiled) << shader.m_name << ":\n" << result.m_log << "\n" << result.m_source;
         injected += result.m_compiled ? 1 : 0;
         if (DefinesMain(WithoutComments(written))) {
-            ExpectDeclarationAfterTheDirectives(shader.m_name, written, result.m_source);
+            ExpectDeclarationAfterDirectives(shader.m_name, written, result.m_source);
         } else {
             without_main += 1;
             EXPECT_EQ(result.m_source, written) << shader.m_name << " has no main to inject into";
@@ -219,12 +208,11 @@ TEST_F(DepthShiftOnMesa, PiglitGlslEs100VertexShadersStillCompileWithTheDeclarat
             << exception.m_name << " is listed but not among the shaders that compile natively";
     }
     for (const std::string& name : left_out) std::printf("left out, fails natively: %s\n", name.c_str());
-    std::printf("piglit corpus: %zu vertex shaders (%d of them shader_test sections), %d compile "
-                "natively, %zu do not and are left out (%d of them expected to fail), %d compile "
-                "after the injection (%d of them without main, kept as written), %zu listed "
-                "exceptions\n",
-                corpus.size(), sections, native, left_out.size(), left_out_expected, injected,
-                without_main, met.size());
+    std::printf("piglit corpus: %zu vertex shaders (%d of them shader_test sections), %d compile natively, %zu do "
+                "not and are left out (%d of them expected to fail), %d compile after the injection (%d of them "
+                "without main, kept as written), %zu listed exceptions\n",
+                corpus.size(), sections, native, left_out.size(), left_out_expected, injected, without_main,
+                met.size());
     EXPECT_GT(native, 0);
     EXPECT_GT(sections, 0);
 }

@@ -36,11 +36,14 @@ std::vector<std::string> Answers(GLuint shader, GetShaderiv get_iv, GetShaderSou
     return answers;
 }
 
-std::string VendorText(GLuint shader) {
+// The source as the library, or past it the vendor, answers it; up to its first NUL.
+std::string SourceOf(GLuint shader, bool from_vendor = false) {
+    const GetShaderiv get_iv = from_vendor ? &ovo::raw::glGetShaderiv : &glGetShaderiv;
+    const GetShaderSource get_source = from_vendor ? &ovo::raw::glGetShaderSource : &glGetShaderSource;
     GLint length = 0;
-    ovo::raw::glGetShaderiv(shader, GL_SHADER_SOURCE_LENGTH, &length);
+    get_iv(shader, GL_SHADER_SOURCE_LENGTH, &length);
     std::string text(static_cast<size_t>(length), '\0');
-    if (length > 0) ovo::raw::glGetShaderSource(shader, length, nullptr, &text[0]);
+    if (length > 0) get_source(shader, length, nullptr, &text[0]);
     return text.c_str();
 }
 
@@ -48,14 +51,6 @@ size_t Occurrences(const std::string& text, const std::string& part) {
     size_t count = 0;
     for (size_t at = text.find(part); at != std::string::npos; at = text.find(part, at + 1)) ++count;
     return count;
-}
-
-std::string ReadThroughLibrary(GLuint shader) {
-    GLint length = 0;
-    glGetShaderiv(shader, GL_SHADER_SOURCE_LENGTH, &length);
-    std::string text(static_cast<size_t>(length), '\0');
-    if (length > 0) glGetShaderSource(shader, length, nullptr, &text[0]);
-    return text.c_str();
 }
 
 GLuint VertexShader(const char* source) {
@@ -111,7 +106,7 @@ TEST_F(ShaderSourceOnMesa, TheApplicationReadsBackItsOwnStringsAsTheVendorJoinsT
         EXPECT_EQ(Answers(through_library, &glGetShaderiv, &glGetShaderSource),
                   Answers(on_mesa, &ovo::raw::glGetShaderiv, &ovo::raw::glGetShaderSource));
         // Mesa holds and compiles the rewrite; its verdict reaches the application as is.
-        EXPECT_EQ(Occurrences(VendorText(through_library), DECLARATION), 1u);
+        EXPECT_EQ(Occurrences(SourceOf(through_library, true), DECLARATION), 1u);
         glCompileShader(through_library);
         GLint compiled = GL_FALSE;
         glGetShaderiv(through_library, GL_COMPILE_STATUS, &compiled);
@@ -129,13 +124,13 @@ TEST_F(ShaderSourceOnMesa, ARefusedSourceKeepsTheOneBefore) {
     const char* refused[] = {"void main() {}\n"};
     glShaderSource(shader, -1, refused, nullptr);
     EXPECT_EQ(glGetError(), static_cast<GLenum>(GL_INVALID_VALUE));
-    EXPECT_EQ(ReadThroughLibrary(shader), source);
-    EXPECT_EQ(Occurrences(VendorText(shader), DECLARATION), 1u);
+    EXPECT_EQ(SourceOf(shader), source);
+    EXPECT_EQ(Occurrences(SourceOf(shader, true), DECLARATION), 1u);
     // A new source replaces the kept one.
     const char replaced[] = "attribute vec4 q;\nvoid main() { gl_Position = q; }\n";
     const char* strings[] = {replaced};
     glShaderSource(shader, 1, strings, nullptr);
-    EXPECT_EQ(ReadThroughLibrary(shader), replaced);
+    EXPECT_EQ(SourceOf(shader), replaced);
     EXPECT_EQ(KeptCount(), 1u);
 }
 
@@ -150,16 +145,16 @@ TEST_F(ShaderSourceOnMesa, SourcesFollowShareGroupsAndGoWithThem) {
     ASSERT_TRUE(MakeCurrent(alone));
     const GLuint in_alone = VertexShader(second);
     ASSERT_EQ(in_alone, in_first) << "Mesa numbers each share group's shaders from 1";
-    EXPECT_EQ(ReadThroughLibrary(in_alone), second);
+    EXPECT_EQ(SourceOf(in_alone), second);
     ASSERT_TRUE(MakeCurrent(sharing));
-    EXPECT_EQ(ReadThroughLibrary(in_first), first);
+    EXPECT_EQ(SourceOf(in_first), first);
     EXPECT_EQ(KeptCount(), 2u);
 
     // The lone context's group ends with it; the first group lives on in the sharing one.
     ASSERT_TRUE(eglDestroyContext(m_session.m_display, alone));
     EXPECT_EQ(KeptCount(), 1u);
     ASSERT_TRUE(eglDestroyContext(m_session.m_display, m_context));
-    EXPECT_EQ(ReadThroughLibrary(in_first), first);
+    EXPECT_EQ(SourceOf(in_first), first);
     glDeleteShader(in_first);
     EXPECT_EQ(KeptCount(), 0u);
 }
