@@ -48,7 +48,7 @@ protected:
     std::vector<int> MaskedRowsPerColumn() {
         static const GLfloat QUAD[] = {-1, -1, 1, -1, -1, 1, 1, 1};
         glViewport(0, 0, m_width, m_height);
-        for (GLenum capability : {GL_SCISSOR_TEST, GL_DEPTH_TEST, GL_BLEND, GL_CULL_FACE}) glDisable(capability);
+        for (GLenum off : {GL_SCISSOR_TEST, GL_DEPTH_TEST, GL_BLEND, GL_CULL_FACE}) glDisable(off);
         glColorMask(GL_TRUE, GL_TRUE, GL_TRUE, GL_TRUE);
         glClearColor(0, 0, 0, 1);
         glClear(GL_COLOR_BUFFER_BIT);
@@ -61,13 +61,14 @@ protected:
             glEnableVertexAttribArray(0);
             glVertexAttribPointer(0, 2, GL_FLOAT, GL_FALSE, 0, QUAD);
         } else {
-            for (GLenum capability : {GL_TEXTURE_2D, GL_LIGHTING, GL_ALPHA_TEST}) glDisable(capability);
+            for (GLenum off : {GL_TEXTURE_2D, GL_LIGHTING, GL_ALPHA_TEST}) glDisable(off);
             glMatrixMode(GL_PROJECTION);
             glLoadIdentity();
             glMatrixMode(GL_MODELVIEW);
             glLoadIdentity();
-            for (GLenum array : {GL_COLOR_ARRAY, GL_TEXTURE_COORD_ARRAY, GL_NORMAL_ARRAY, GL_POINT_SIZE_ARRAY_OES})
-                glDisableClientState(array);
+            for (GLenum off :
+                 {GL_COLOR_ARRAY, GL_TEXTURE_COORD_ARRAY, GL_NORMAL_ARRAY, GL_POINT_SIZE_ARRAY_OES})
+                glDisableClientState(off);
             glEnableClientState(GL_VERTEX_ARRAY);
             glVertexPointer(2, GL_FLOAT, 0, QUAD);
             glColor4f(1, 0, 0, 1);
@@ -166,8 +167,9 @@ const ProbeGroups GL2_PROBES = {
 };
 
 const ProbeGroups GL1_PROBES = {
-    {Probe::INTEGERS, 1, {GL_MATRIX_MODE, GL_BLEND_SRC, GL_BLEND_DST, GL_ALPHA_TEST_FUNC, GL_VERTEX_ARRAY_SIZE,
-                          GL_VERTEX_ARRAY_TYPE, GL_VERTEX_ARRAY_STRIDE, GL_TEXTURE_COORD_ARRAY_STRIDE}},
+    {Probe::INTEGERS, 1, {GL_MATRIX_MODE, GL_BLEND_SRC, GL_BLEND_DST, GL_ALPHA_TEST_FUNC,
+                          GL_VERTEX_ARRAY_SIZE, GL_VERTEX_ARRAY_TYPE, GL_VERTEX_ARRAY_STRIDE,
+                          GL_TEXTURE_COORD_ARRAY_STRIDE}},
     {Probe::FLOATS, 16, {GL_PROJECTION_MATRIX, GL_MODELVIEW_MATRIX}},
     {Probe::FLOATS, 4, {GL_CURRENT_COLOR}},
     {Probe::FLOATS, 1, {GL_ALPHA_TEST_REF}},
@@ -187,7 +189,7 @@ void SetSharedApplicationState() {
     glViewport(3, 5, 100, 90);
     // Larger than the window: the mask's clear honours the application's scissor test.
     glScissor(0, 0, 100, 90);
-    for (GLenum capability : {GL_SCISSOR_TEST, GL_BLEND, GL_DEPTH_TEST, GL_CULL_FACE}) glEnable(capability);
+    for (GLenum on : {GL_SCISSOR_TEST, GL_BLEND, GL_DEPTH_TEST, GL_CULL_FACE}) glEnable(on);
     glCullFace(GL_FRONT);
     glFrontFace(GL_CW);
     glColorMask(GL_TRUE, GL_FALSE, GL_TRUE, GL_FALSE);
@@ -203,7 +205,7 @@ void SetGl1ApplicationState() {
     glTranslatef(1, 2, -5);
     glMatrixMode(GL_TEXTURE);
     glBlendFunc(GL_SRC_ALPHA, GL_ONE);
-    for (GLenum capability : {GL_ALPHA_TEST, GL_TEXTURE_2D, GL_LIGHTING}) glEnable(capability);
+    for (GLenum on : {GL_ALPHA_TEST, GL_TEXTURE_2D, GL_LIGHTING}) glEnable(on);
     glAlphaFunc(GL_GREATER, 0.25f);
     glTexEnvi(GL_TEXTURE_ENV, GL_TEXTURE_ENV_MODE, GL_DECAL);
     glDisableClientState(GL_VERTEX_ARRAY);
