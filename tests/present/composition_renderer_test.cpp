@@ -1,6 +1,7 @@
 // The column mask on the recording vendor: the lines, the stencil references, the panel's
 // composition start, the exact calls of one frame in each drawing path, and the mask a
-// window surface gets at its first stereo draw after it was made current.
+// window surface gets at its first stereo draw after it was made current; and the saved-state
+// tables beyond what the mask's two paths exercise.
 #include "present/composition_renderer.h"
 
 #include <gtest/gtest.h>
@@ -11,6 +12,7 @@
 #include <utility>
 #include <vector>
 
+#include "core/gl_state_table.h"
 #include "core/stereo_manager.h"
 #include "egl/context_registry.h"
 #include "stereo/es1_stereo_layer.h"
@@ -88,9 +90,7 @@ struct Line {
 struct LineCase {
     const char* m_label;
     DrawingPath m_path;
-    int32_t m_width;
-    int32_t m_height;
-    int32_t m_count;
+    int32_t m_width, m_height, m_count;
     Line m_first;
     Line m_last;
 };
@@ -468,25 +468,13 @@ protected:
 class NewSurfaceMaskPathTest : public NewSurfaceMaskTest,
                                public ::testing::WithParamInterface<DrawingPath> {};
 
-// The second draw is the baseline: the first is the same with the mask before its mask test.
-TEST_P(NewSurfaceMaskPathTest, AnotherSurfaceGetsTheStencilOnlyMaskOnceBeforeItsMaskTest) {
-    StartPresented(GetParam());
-    MakeCurrent(OTHER_SURFACE);
-    const Calls first = Draw();
-    const Calls second = Draw();
-    ExpectCalls(BeforeMaskTest(second, NewSurfaceMask()), first);
-}
-
-INSTANTIATE_TEST_SUITE_P(Paths, NewSurfaceMaskPathTest, ::testing::Values(PATH_GL1, PATH_GL2),
-                         [](const ::testing::TestParamInfo<DrawingPath>& test) {
-                             return test.param == PATH_GL2 ? "Gl2" : "Gl1";
-                         });
-
 enum Release { RELEASE_NONE, RELEASE_MAKE_CURRENT, RELEASE_THREAD };
 
-// Each case follows the one before it, on a surface that a Present has just masked.
-TEST_F(NewSurfaceMaskTest, ASurfaceIsMaskedAgainOnlyAfterAReleaseOrAnotherSurface) {
-    StartPresented(PATH_GL1);
+// Each case follows the one before it, on a surface that a Present has just masked: its
+// first draw is the plain one with the stencil-only mask before its mask test, or the
+// plain one; its second draw is the plain one.
+TEST_P(NewSurfaceMaskPathTest, ASurfaceIsMaskedAgainOnlyAfterAReleaseOrAnotherSurface) {
+    StartPresented(GetParam());
     const Calls plain = Draw();
     struct Case {
         const char* m_label;
@@ -517,6 +505,11 @@ TEST_F(NewSurfaceMaskTest, ASurfaceIsMaskedAgainOnlyAfterAReleaseOrAnotherSurfac
         ExpectCalls(plain, Draw());
     }
 }
+
+INSTANTIATE_TEST_SUITE_P(Paths, NewSurfaceMaskPathTest, ::testing::Values(PATH_GL1, PATH_GL2),
+                         [](const ::testing::TestParamInfo<DrawingPath>& test) {
+                             return test.param == PATH_GL2 ? "Gl2" : "Gl1";
+                         });
 
 TEST_F(NewSurfaceMaskTest, NothingIsMaskedBeforeTheProcesssFirstPresent) {
     StartInterleaved(PATH_GL1, 1280, 720);
@@ -560,6 +553,40 @@ TEST_F(CompositionRendererTest, AContextOfNoKnownGroupDeletesItsProgramEachFrame
     const std::vector<std::string> calls = RecordedGlCalls();
     EXPECT_EQ(std::count(calls.begin(), calls.end(), "glCreateProgram()"), 2);
     EXPECT_EQ(std::count(calls.begin(), calls.end(), "glDeleteProgram(7)"), 2);
+}
+
+// Appending saves, the capacity, and positions that were never saved.
+TEST(GlStateTableTest, SavesAppendUpToTheCapacityAndRestoreOnlyWhatWasSaved) {
+    vendor_root::InstallRecorder();
+    EglSession egl;
+    egl.Open();
+    ASSERT_EQ(egl.MakeCurrent(egl.CreateContext(1)), EGL_TRUE);
+    const ovo::GlStateItem alpha = {ovo::GL_STATE_ALPHA_FUNC, 0, true, {GL_NOTEQUAL, 0}};
+    std::vector<ovo::GlStateItem> many(ovo::GL_STATE_CAPACITY + 5,
+                                       {ovo::GL_STATE_ENABLE, GL_DITHER, false, {}});
+    many[ovo::GL_STATE_CAPACITY - 2] = {ovo::GL_STATE_ENABLE, GL_FOG, true, {0}};
+    AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_ALPHA_TEST_FUNC, {GL_LESS});
+    AnswerFloats(ovo::GL_ENTRY_glGetFloatv, GL_ALPHA_TEST_REF, {0.75f});
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_FOG, GL_TRUE);
+    AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_DITHER, GL_FALSE);
+    ResetRecorder();
+
+    ovo::GlStateSnapshot saved;
+    saved.Save(&alpha, 1);
+    saved.Save(many.data(), many.size());
+    EXPECT_EQ(saved.Count(), ovo::GL_STATE_CAPACITY);
+    std::vector<std::string> calls = RecordedGlCalls();
+    ASSERT_EQ(calls.size(), 2 + 1 + (ovo::GL_STATE_CAPACITY - 1) + 1);
+    EXPECT_EQ(calls[2], "glAlphaFunc(0x0205, 0)");
+    EXPECT_EQ(calls[calls.size() - 2], "glIsEnabled(0x0B60)") << "the last item that fits";
+    EXPECT_EQ(calls.back(), "glDisable(0x0B60)");
+
+    ResetRecorder();
+    const uint8_t order[] = {ovo::GL_STATE_CAPACITY - 1, ovo::GL_STATE_CAPACITY, 0, 200, 1};
+    saved.Restore(order, std::size(order));
+    EXPECT_EQ(RecordedGlCalls(), (std::vector<std::string>{"glEnable(0x0B60)",
+                                                           "glAlphaFunc(0x0201, 0.75)",
+                                                           "glDisable(0x0BD0)"}));
 }
 
 }  // namespace

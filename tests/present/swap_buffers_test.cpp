@@ -1,13 +1,19 @@
 // The per-frame work at eglSwapBuffers: the vendor's answer, the panel refresh on
-// processor time and the live-tuning file.
+// processor time and the live-tuning file; and the panel nodes' requests.
 #include <gtest/gtest.h>
+#include <sys/ioctl.h>
+#include <unistd.h>
 
 #include <ctime>
+#include <filesystem>
+#include <iterator>
 #include <string>
+#include <vector>
 
 #include "core/stereo_manager.h"
 #include "present/composition_renderer.h"
 #include "present/live_tuning.h"
+#include "present/panel_control.h"
 #include "stereo/draw_call.h"
 #include "stereo/overlay_target.h"
 #include "support/recorded_calls.h"
@@ -64,11 +70,8 @@ TEST_F(SwapBuffersTest, ThePanelIsReassertedAfterATenthOfASecondOfProcessorTime)
 
 TEST_F(SwapBuffersTest, TheRequestFollowsTheTargetsOrientation) {
     struct Case {
-        int32_t m_width;
-        int32_t m_height;
-        bool m_force_portrait;
-        bool m_shader_convert;
-        bool m_node;
+        int32_t m_width, m_height;
+        bool m_force_portrait, m_shader_convert, m_node;
         std::string m_request;
         float m_eye_distance;  // 0.02 once the live-tuning file was read
     } cases[] = {{800, 480, false, true, true, LANDSCAPE, 0.02f},
@@ -78,6 +81,7 @@ TEST_F(SwapBuffersTest, TheRequestFollowsTheTargetsOrientation) {
                  {800, 480, false, true, false, "", 0.02f},       // no panel node: the file is still read
                  {800, 480, false, false, true, "", 7.0f}};       // no shader conversion: neither
     for (const Case& each : cases) {
+        SCOPED_TRACE(std::to_string(each.m_width) + "x" + std::to_string(each.m_height));
         each.m_node ? device_files::Write("/dev/zpx", "") : device_files::Remove("/dev/zpx");
         device_files::Write("/sdcard/game_profile.txt", "0.02 1.5");
         Profile().m_target_width = each.m_width;
@@ -88,8 +92,8 @@ TEST_F(SwapBuffersTest, TheRequestFollowsTheTargetsOrientation) {
         Swap();
         BurnProcessorTime(0.15);
         Swap();
-        EXPECT_EQ(PanelRequests(), each.m_request) << each.m_width << "x" << each.m_height;
-        EXPECT_EQ(Profile().m_eye_distance, each.m_eye_distance) << each.m_width << "x" << each.m_height;
+        EXPECT_EQ(PanelRequests(), each.m_request);
+        EXPECT_EQ(Profile().m_eye_distance, each.m_eye_distance);
     }
 }
 
@@ -135,34 +139,80 @@ __attribute__((noinline)) void DirtyTheStack() {
     static_cast<void>(junk[0]);
 }
 
+// Positions without a number are 0; how the text reads is LiveTuning.ReadsAShortFileAsFscanfReadsIt's.
 TEST_F(SwapBuffersTest, TheLiveTuningFileSetsFourParameters) {
-    struct Case {
+    const struct {
         const char* m_text;
-        float m_expected[4];
+        std::vector<float> m_expected;
     } cases[] = {
         {"0.02 1.5", {0.02f, 1.5f, 0.0f, 0.0f}},
         {"", {0.0f, 0.0f, 0.0f, 0.0f}},
         {"1 2 3 4 5 6", {1.0f, 2.0f, 3.0f, 4.0f}},
-        {"0.5 x 3", {0.5f, 0.0f, 0.0f, 0.0f}},
-        {"garbage", {0.0f, 0.0f, 0.0f, 0.0f}},
         {"-1e3\n\t2.5   -0.25\n8", {-1000.0f, 2.5f, -0.25f, 8.0f}},
     };
     ovo::StereoProfile& profile = Profile();
-    for (const Case& each : cases) {
+    for (const auto& each : cases) {
         profile.m_eye_distance = profile.m_eye_angle = profile.m_eye_shift = profile.m_ramp_steps = 9.0f;
         device_files::Write("/sdcard/game_profile.txt", each.m_text);
         DirtyTheStack();
         ovo::ReadLiveTuning(profile);
-        const float got[4] = {profile.m_eye_distance, profile.m_eye_angle, profile.m_eye_shift,
-                              profile.m_ramp_steps};
-        for (int position = 0; position < 4; ++position) {
-            EXPECT_EQ(got[position], each.m_expected[position]) << '"' << each.m_text << '"';
-        }
+        EXPECT_EQ((std::vector<float>{profile.m_eye_distance, profile.m_eye_angle, profile.m_eye_shift,
+                                      profile.m_ramp_steps}),
+                  each.m_expected)
+            << '"' << each.m_text << '"';
         EXPECT_EQ(profile.m_eye_distance_set, 0.0f) << "configured values stay";
     }
     device_files::Remove("/sdcard/game_profile.txt");
     ovo::ReadLiveTuning(profile);
     EXPECT_EQ(profile.m_eye_distance, -1000.0f) << "a missing file changes nothing";
+}
+
+TEST(PanelControlTest, EachModeReachesThePanelNodeByValue) {
+    device_files::Write("/dev/zpx", "");
+    EXPECT_TRUE(ovo::SetPanelMode(false, true));
+    EXPECT_TRUE(ovo::SetPanelMode(true, true));
+    EXPECT_TRUE(ovo::SetPanelMode(true, false));
+    EXPECT_EQ(device_files::Read("/dev/zpx"),
+              "request=0xc0047602 argument=0\n"
+              "request=0xc0047602 argument=1\n"
+              "request=0xc0047602 argument=2\n");
+}
+
+TEST(PanelControlTest, CompositionStartSendsOneAndMissingNodesAreSilent) {
+    device_files::Write("/dev/zdriver", "");
+    ovo::SendCompositionStart();
+    EXPECT_EQ(device_files::Read("/dev/zdriver"), "request=0x616 argument=1\n");
+    device_files::Remove("/dev/zpx");
+    device_files::Remove("/dev/zdriver");
+    EXPECT_FALSE(ovo::SetPanelMode(true, true));
+    ovo::SendCompositionStart();
+    EXPECT_FALSE(std::filesystem::exists(device_files::Path("/dev/zpx")));
+    EXPECT_FALSE(std::filesystem::exists(device_files::Path("/dev/zdriver")));
+}
+
+size_t OpenDescriptors() {
+    return static_cast<size_t>(std::distance(std::filesystem::directory_iterator("/proc/self/fd"),
+                                             std::filesystem::directory_iterator()));
+}
+
+// The panel is asked again about ten times a second for as long as the game runs.
+TEST(PanelControlTest, EveryPanelRequestClosesItsNode) {
+    device_files::Write("/dev/zpx", "");
+    const size_t before = OpenDescriptors();
+    for (int request = 0; request < 50; ++request) ASSERT_TRUE(ovo::SetPanelMode(true, request % 2 == 0));
+    EXPECT_EQ(OpenDescriptors(), before);
+}
+
+// The stand-in answers only for its plain-file nodes; everything else reaches the real ioctl.
+TEST(PanelControlTest, OtherDescriptorsReachTheRealDriver) {
+    int channel[2];
+    ASSERT_EQ(pipe(channel), 0);
+    ASSERT_EQ(write(channel[1], "abc", 3), 3);
+    int pending = 0;
+    EXPECT_EQ(ioctl(channel[0], FIONREAD, &pending), 0);
+    EXPECT_EQ(pending, 3);
+    close(channel[0]);
+    close(channel[1]);
 }
 
 }  // namespace

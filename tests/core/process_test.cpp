@@ -1,6 +1,7 @@
-// Calls made after the manager has been released at process exit, as an exit handler or a
-// thread that runs on makes them: they pass straight to the vendor and the process exits
-// cleanly, with stereo on or off.
+// Tests in processes of their own: the manager takes the application's name from the first
+// argument of its command line; and calls made after the manager has been released at
+// process exit, as an exit handler or a thread that runs on makes them, pass straight to the
+// vendor and the process exits cleanly, with stereo on or off.
 #include <EGL/egl.h>
 #include <GLES/gl.h>
 #include <gtest/gtest.h>
@@ -20,6 +21,31 @@
 #include "support/vendor_root.h"
 
 namespace {
+
+TEST(ProcessNameTest, DISABLED_PrintName) {
+    char name[ovo::PROCESS_NAME_CAPACITY];
+    ovo::StereoManager::ReadProcessName(name);
+    std::printf("name=[%s]\n", name);
+}
+
+TEST(ProcessNameTest, IsTheFirstArgumentCutAtWhitespace) {
+    struct Case {
+        std::string m_command_line;
+        std::string m_expected;
+    } cases[] = {
+        {"com.example.game", "com.example.game"},
+        {"app --flag", "app"},
+        {"tab\tseparated", "tab"},
+        {std::string(2000, 'n'), std::string(ovo::PROCESS_NAME_CAPACITY - 1, 'n')},
+    };
+    for (const Case& each : cases) {
+        ScenarioResult result =
+            RunScenario(each.m_command_line.c_str(), "ProcessNameTest.DISABLED_PrintName");
+        EXPECT_EQ(result.m_exit_code, 0);
+        EXPECT_NE(result.m_output.find("name=[" + each.m_expected + "]\n"), std::string::npos)
+            << result.m_output.substr(0, 200);
+    }
+}
 
 EglSession g_game;
 
