@@ -1,15 +1,17 @@
-// The library's own objects of a context on Mesa: deleted when the application ends the
-// context, in it, with the thread's own binding back afterwards; and eglGetError after each
-// of the application's EGL calls reports what Mesa reports for the same calls made without
-// the library.
+// On Mesa, through the library: glGetError and eglGetError after an application's call
+// report what Mesa said about that call, never an error of the library's own calls around
+// it; and the library's own objects of a context are deleted when the application ends the
+// context, in it, with the thread's own binding back afterwards.
 #include <EGL/egl.h>
 #include <GLES2/gl2.h>
 #include <gtest/gtest.h>
 
+#include <cstdint>
 #include <thread>
 #include <vector>
 
 #include "core/raw_egl.h"
+#include "core/raw_gl.h"
 #include "core/stereo_manager.h"
 #include "egl/current_context.h"
 #include "present/composition_renderer.h"
@@ -27,42 +29,36 @@ struct EyeNames {
     GLuint m_program = 0;
 };
 
-// The application's EGL calls, through the library or straight to Mesa.
-struct EglCalls {
-    decltype(&::eglCreateContext) m_create;
-    decltype(&::eglMakeCurrent) m_make_current;
-    decltype(&::eglDestroyContext) m_destroy;
-    decltype(&::eglTerminate) m_terminate;
-    decltype(&::eglSwapBuffers) m_swap;
-};
-const EglCalls LIBRARY = {&::eglCreateContext, &::eglMakeCurrent, &::eglDestroyContext,
-                          &::eglTerminate, &::eglSwapBuffers};
-const EglCalls MESA = {&ovo::vendor_egl::eglCreateContext, &ovo::vendor_egl::eglMakeCurrent,
-                       &ovo::vendor_egl::eglDestroyContext, &ovo::vendor_egl::eglTerminate,
-                       &ovo::vendor_egl::eglSwapBuffers};
-
-// One run of a scenario: through the library, which draws a render texture before each
-// swap (so that it keeps eye textures and a mask program), or straight to Mesa, which
-// only swaps. eglGetError is read after each of the application's EGL calls.
+// One run of a scenario: the application's EGL calls through the library, which draws a
+// render texture before each swap (so that it keeps eye textures and a mask program), or
+// straight to Mesa, which only swaps. eglGetError is read after each of them.
 class EglRun {
 public:
-    explicit EglRun(bool library) : m_library(library), m_egl(library ? LIBRARY : MESA) {
+    explicit EglRun(bool library) : m_library(library) {
         m_session.Open(2);
         for (EGLSurface& surface : m_surfaces) surface = m_session.CreateSurface(16, 16);
     }
 
     EGLContext Create(EGLContext share = EGL_NO_CONTEXT) {
         const EGLint version[] = {EGL_CONTEXT_CLIENT_VERSION, 2, EGL_NONE};
-        return Noted(m_egl.m_create(m_session.m_display, m_session.m_config, share, version));
+        auto create = m_library ? &::eglCreateContext : &ovo::vendor_egl::eglCreateContext;
+        return Noted(create(m_session.m_display, m_session.m_config, share, version));
     }
     // With the surface of the main thread (0) or of another (1): a surface is current on
     // one thread at most.
     void MakeCurrent(EGLContext context, int thread = 0) {
         const EGLSurface surface = context != EGL_NO_CONTEXT ? m_surfaces[thread] : EGL_NO_SURFACE;
-        Noted(m_egl.m_make_current(m_session.m_display, surface, surface, context));
+        auto make_current = m_library ? &::eglMakeCurrent : &ovo::vendor_egl::eglMakeCurrent;
+        Noted(make_current(m_session.m_display, surface, surface, context));
     }
-    void Destroy(EGLContext context) { Noted(m_egl.m_destroy(m_session.m_display, context)); }
-    void Terminate() { Noted(m_egl.m_terminate(m_session.m_display)); }
+    void Destroy(EGLContext context) {
+        auto destroy = m_library ? &::eglDestroyContext : &ovo::vendor_egl::eglDestroyContext;
+        Noted(destroy(m_session.m_display, context));
+    }
+    void Terminate() {
+        auto terminate = m_library ? &::eglTerminate : &ovo::vendor_egl::eglTerminate;
+        Noted(terminate(m_session.m_display));
+    }
     // A frame, swapped. The library's eye textures of the current context that the draw
     // left, if any.
     EyeNames Draw(int thread = 0) {
@@ -71,7 +67,8 @@ public:
             draw.Create(8);
             draw.DrawToWindow();
         }
-        Noted(m_egl.m_swap(m_session.m_display, m_surfaces[thread]));
+        auto swap = m_library ? &::eglSwapBuffers : &ovo::vendor_egl::eglSwapBuffers;
+        Noted(swap(m_session.m_display, m_surfaces[thread]));
         if (!m_library) return {};
         const ovo::EyeTexturePair* eyes =
             ovo::StereoManager::instance().m_eye_textures->Find(ovo::CurrentContext());
@@ -108,7 +105,6 @@ private:
         return result;
     }
 
-    EglCalls m_egl;
     MesaSession m_session;
     EGLSurface m_surfaces[2] = {};
 };
@@ -226,6 +222,47 @@ TEST_F(ContextObjectsOnMesa, TerminatingADisplayWithSeveralContexts) {
         }
         run.MakeCurrent(EGL_NO_CONTEXT);
     });
+}
+
+using ApplicationErrorsOnMesa = MesaSessionTest;
+
+// A context made current without a surface: nothing to take a size from, and no error.
+TEST_F(ApplicationErrorsOnMesa, MakingAContextCurrentWithoutASurfaceLeavesSuccess) {
+    ASSERT_EQ(eglMakeCurrent(m_session.m_display, EGL_NO_SURFACE, EGL_NO_SURFACE, m_context),
+              EGL_TRUE);
+    EXPECT_EQ(eglGetError(), EGL_SUCCESS);
+}
+
+// A context current on another thread cannot be made current here: the application learns
+// why from eglGetError, not that some later query of the library's succeeded.
+TEST_F(ApplicationErrorsOnMesa, ARefusedMakeCurrentReportsTheVendorsError) {
+    std::thread([&] {
+        ASSERT_EQ(eglMakeCurrent(m_session.m_display, m_surface, m_surface, m_context), EGL_TRUE);
+    }).join();
+    EXPECT_EQ(eglMakeCurrent(m_session.m_display, m_surface, m_surface, m_context), EGL_FALSE);
+    EXPECT_EQ(eglGetError(), EGL_BAD_ACCESS);
+}
+
+// A draw without a program: whatever Mesa says of the draw, and nothing of the depth-shift
+// lookup that the stereo draw makes around it.
+TEST_F(ApplicationErrorsOnMesa, AStereoDrawWithoutAProgramRaisesOnlyTheDrawsError) {
+    ASSERT_EQ(eglMakeCurrent(m_session.m_display, m_surface, m_surface, m_context), EGL_TRUE);
+    ovo::StereoManager& manager = ovo::StereoManager::instance();
+    for (uint32_t submode : {ovo::LAYER_SUBMODE_DIRECT, ovo::LAYER_SUBMODE_TRACKED}) {
+        SCOPED_TRACE(submode);
+        delete manager.m_layer;
+        manager.m_layer = new ovo::Es2StereoLayer(submode);
+        glUseProgram(0);
+        const GLushort indices[3] = {0, 1, 2};
+        ovo::raw::glDrawArrays(GL_TRIANGLES, 0, 3);
+        const GLenum arrays = ovo::raw::glGetError();
+        glDrawArrays(GL_TRIANGLES, 0, 3);
+        EXPECT_EQ(glGetError(), arrays);
+        ovo::raw::glDrawElements(GL_TRIANGLES, 3, GL_UNSIGNED_SHORT, indices);
+        const GLenum elements = ovo::raw::glGetError();
+        glDrawElements(GL_TRIANGLES, 3, GL_UNSIGNED_SHORT, indices);
+        EXPECT_EQ(glGetError(), elements);
+    }
 }
 
 }  // namespace
