@@ -81,18 +81,20 @@ public:
         names.m_program = eyes->m_eyes[0].m_program;
         return names;
     }
-    // Whether Mesa still has any of `names`, asked in the current context.
-    static bool AnyAlive(const EyeNames& names) {
-        bool alive = names.m_program != 0 && glIsProgram(names.m_program);
-        for (GLuint texture : names.m_textures) alive = alive || glIsTexture(texture);
-        for (GLuint framebuffer : names.m_framebuffers) alive = alive || glIsFramebuffer(framebuffer);
-        return alive;
-    }
-    // The thread is bound to `context` and this run's surface, as the application left it.
-    void ExpectBoundTo(EGLContext context) const {
-        EXPECT_EQ(ovo::vendor_egl::eglGetCurrentContext(), context);
+    // In a run through the library: whether Mesa still has any of `names`, asked in the
+    // current context; with `bound`, that the thread is bound to it and this run's surface,
+    // as the application left it, and that no GL error is pending.
+    void ExpectAlive(const EyeNames& names, bool alive, EGLContext bound = EGL_NO_CONTEXT) const {
+        if (!m_library) return;
+        bool any = names.m_program != 0 && glIsProgram(names.m_program);
+        for (GLuint texture : names.m_textures) any = any || glIsTexture(texture);
+        for (GLuint framebuffer : names.m_framebuffers) any = any || glIsFramebuffer(framebuffer);
+        EXPECT_EQ(any, alive);
+        if (bound == EGL_NO_CONTEXT) return;
+        EXPECT_EQ(ovo::vendor_egl::eglGetCurrentContext(), bound);
         EXPECT_EQ(ovo::vendor_egl::eglGetCurrentSurface(EGL_DRAW), m_surfaces[0]);
         EXPECT_EQ(ovo::vendor_egl::eglGetCurrentSurface(EGL_READ), m_surfaces[0]);
+        EXPECT_EQ(glGetError(), GL_NO_ERROR);
     }
 
     bool m_library;
@@ -142,15 +144,9 @@ TEST_F(ContextObjectsOnMesa, AContextEndedWhileAnotherIsCurrent) {
         const EyeNames names = run.Draw();
         run.MakeCurrent(own);
         run.Draw();
-        if (run.m_library) {
-            EXPECT_TRUE(EglRun::AnyAlive(names));
-        }
+        run.ExpectAlive(names, true);
         run.Destroy(ended);
-        if (run.m_library) {
-            run.ExpectBoundTo(own);
-            EXPECT_FALSE(EglRun::AnyAlive(names));
-            EXPECT_EQ(glGetError(), GL_NO_ERROR);
-        }
+        run.ExpectAlive(names, false, own);
         run.Destroy(ended);  // no longer a context
         run.MakeCurrent(EGL_NO_CONTEXT);
         run.Destroy(own);
@@ -162,19 +158,12 @@ TEST_F(ContextObjectsOnMesa, AContextEndedWhileCurrent) {
         const EGLContext ended = run.Create();
         run.MakeCurrent(ended);
         const EyeNames names = run.Draw();
-        if (run.m_library) {
-            EXPECT_TRUE(EglRun::AnyAlive(names));
-        }
+        run.ExpectAlive(names, true);
         run.Destroy(ended);
-        if (run.m_library) {
-            run.ExpectBoundTo(ended);  // until the thread leaves it
-            EXPECT_FALSE(EglRun::AnyAlive(names));
-        }
+        run.ExpectAlive(names, false, ended);  // bound until the thread leaves it
         // Still current: the next frame's objects are the frame's own.
         run.Draw();
-        if (run.m_library) {
-            EXPECT_EQ(glGetError(), GL_NO_ERROR);
-        }
+        run.ExpectAlive({}, false, ended);
         run.MakeCurrent(EGL_NO_CONTEXT);
     });
 }
@@ -192,10 +181,7 @@ TEST_F(ContextObjectsOnMesa, AContextEndedWhileCurrentOnAnotherThread) {
         }).join();
         run.MakeCurrent(own);
         run.Destroy(elsewhere);
-        if (run.m_library) {
-            run.ExpectBoundTo(own);
-            EXPECT_TRUE(EglRun::AnyAlive(names)) << "forgotten, not deleted from another context";
-        }
+        run.ExpectAlive(names, true, own);  // forgotten, not deleted from another context
         run.MakeCurrent(EGL_NO_CONTEXT);
     });
 }
@@ -212,14 +198,10 @@ TEST_F(ContextObjectsOnMesa, TerminatingADisplayWithSeveralContexts) {
         names[0] = run.Draw();
         run.MakeCurrent(own);
         names[1] = run.Draw();
-        if (run.m_library) {
-            for (const EyeNames& each : names) EXPECT_TRUE(EglRun::AnyAlive(each));
-        }
+        for (const EyeNames& each : names) run.ExpectAlive(each, true);
         run.Terminate();
-        if (run.m_library) {
-            run.ExpectBoundTo(own);  // the display's contexts end as the thread leaves them
-            for (const EyeNames& each : names) EXPECT_FALSE(EglRun::AnyAlive(each));
-        }
+        // The display's contexts end as the thread leaves them.
+        for (const EyeNames& each : names) run.ExpectAlive(each, false, own);
         run.MakeCurrent(EGL_NO_CONTEXT);
     });
 }
