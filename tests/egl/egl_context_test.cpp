@@ -4,14 +4,9 @@
 
 #include <cstdio>
 #include <filesystem>
-#include <fstream>
 #include <regex>
-#include <sstream>
 #include <string>
-#include <utility>
-#include <vector>
 
-#include "core/entry_tables.h"
 #include "core/stereo_manager.h"
 #include "entry/gl_dispatch.h"
 #include "support/device_files.h"
@@ -23,21 +18,14 @@
 
 namespace {
 
-const std::string REPORT = OVO_TEST_DEVICE_ROOT "/sdcard/duoscope/version.txt";
-
-std::string ReadReport() {
-    std::ifstream file(REPORT);
-    std::stringstream text;
-    text << file.rdbuf();
-    return text.str();
-}
+const char REPORT[] = "/sdcard/duoscope/version.txt";
 
 class EglContextTest : public ::testing::Test {
 protected:
     void SetUp() override {
         vendor_root::InstallRecorder();
         std::filesystem::remove_all(OVO_TEST_DEVICE_ROOT "/sdcard");
-        std::filesystem::create_directories(OVO_TEST_DEVICE_ROOT "/sdcard/duoscope");
+        device_files::Write("/sdcard/duoscope/.keep", "");
         m_egl.Open();
         ASSERT_NE(m_egl.m_display, EGL_NO_DISPLAY);
     }
@@ -66,10 +54,10 @@ TEST_F(EglContextTest, AnEnabledProcessKeepsItsFirstEs2Layer) {
 TEST_F(EglContextTest, DISABLED_PrintReports) {
     Profile().m_enabled = true;
     m_egl.CreateContext(2);
-    std::printf("report[%s]\n", ReadReport().c_str());
+    std::printf("report[%s]\n", device_files::Read(REPORT).c_str());
     m_egl.CreateContext(2);
     eglCreateContext(m_egl.m_display, nullptr, EGL_NO_CONTEXT, nullptr);
-    std::printf("report[%s]\n", ReadReport().c_str());
+    std::printf("report[%s]\n", device_files::Read(REPORT).c_str());
 }
 
 TEST(VersionReportTest, NamesTheBuildThePackageAndTheLastContextsVersion) {
@@ -87,7 +75,7 @@ TEST(VersionReportTest, NamesTheBuildThePackageAndTheLastContextsVersion) {
 TEST_F(EglContextTest, ADisabledProcessWritesNoReportAndKeepsItsLayer) {
     ovo::GlLayer* layer = Manager().m_layer;
     ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
-    EXPECT_FALSE(std::filesystem::exists(REPORT));
+    EXPECT_FALSE(std::filesystem::exists(device_files::Path(REPORT)));
     EXPECT_EQ(Manager().m_layer, layer);
     EXPECT_FALSE(Manager().m_es2_layer_installed);
     ResetRecorder();
@@ -100,12 +88,8 @@ TEST_F(EglContextTest, TheFirstSurfaceFillsMissingSizes) {
     Manager().m_scissor = ovo::GlRect{0, 0, 640, 360};
     ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(2)), EGL_TRUE);
     const ovo::StereoProfile& profile = Profile();
-    for (int32_t width : {profile.m_target_width, profile.m_screen_width, profile.m_width}) {
-        EXPECT_EQ(width, 1280);
-    }
-    for (int32_t height : {profile.m_target_height, profile.m_screen_height, profile.m_height}) {
-        EXPECT_EQ(height, 720);
-    }
+    for (int32_t width : {profile.m_target_width, profile.m_screen_width, profile.m_width}) EXPECT_EQ(width, 1280);
+    for (int32_t height : {profile.m_target_height, profile.m_screen_height, profile.m_height}) EXPECT_EQ(height, 720);
     EXPECT_EQ(Manager().ScaleX(), 1.0f);
     EXPECT_EQ(Manager().ScaleY(), 1.0f);
     EXPECT_EQ(Manager().m_viewport.m_x, 3);
@@ -158,7 +142,6 @@ TEST(EglProfileTest, AProfileFileTurnsStereoOnForTheProcess) {
                         device_files::ProfileFile({{0x2301, {1}}, {0x2403, {1}}, {0x2201, {800, 480}}, {0x2101, {0x3102}}}));
     EglSession egl;
     egl.Open();
-    EXPECT_FALSE(std::filesystem::exists(device_files::Path("/sdcard/stereoconv/game/stereo_gm.ovo")));
     ovo::StereoManager& manager = ovo::StereoManager::instance();
     EXPECT_EQ(manager.m_profile->ResolveMode(), ovo::STEREO_MODE_SHADER);
     EXPECT_EQ(manager.ScaleX(), 1.0f);
@@ -169,7 +152,7 @@ TEST(EglProfileTest, AProfileFileTurnsStereoOnForTheProcess) {
     ASSERT_EQ(egl.MakeCurrent(egl.CreateContext(2)), EGL_TRUE);
     EXPECT_TRUE(manager.m_es2_layer_installed);
     EXPECT_EQ(manager.m_profile->m_target_width, 800) << "the profile's size wins over the surface";
-    EXPECT_NE(ReadReport().find("\tOpenGL ES 2.0\n"), std::string::npos);
+    EXPECT_NE(device_files::Read(REPORT).find("\tOpenGL ES 2.0\n"), std::string::npos);
 }
 
 // Run under the profile the caller installed: the mode and whether the manager interleaves,

@@ -1,13 +1,8 @@
 // Threads against Mesa, through the library: many first calls at once, a thread without a
 // context beside stereo frames, and a context made on one thread and drawn with on others.
-#include <EGL/egl.h>
-#include <GLES/gl.h>
-#include <gtest/gtest.h>
-
 #include <cstdlib>
 #include <vector>
 
-#include "core/stereo_manager.h"
 #include "threads_together.h"
 
 namespace {
@@ -87,21 +82,7 @@ protected:
 };
 
 TEST_F(ThreadsOnMesa, FirstCallsOfManyThreadsAtOnceGiveOneWorkingDisplay) {
-    EGLDisplay displays[THREAD_COUNT];
-    EGLBoolean initialised[THREAD_COUNT];
-    GLenum errors[THREAD_COUNT];
-    RunTogether(THREAD_COUNT, [&](int number) {
-        if (number % 2 == 0) errors[number] = glGetError();
-        displays[number] = eglGetDisplay(EGL_DEFAULT_DISPLAY);
-        initialised[number] = eglInitialize(displays[number], nullptr, nullptr);
-        if (number % 2 == 1) errors[number] = glGetError();
-    });
-    for (int number = 0; number < THREAD_COUNT; ++number) {
-        EXPECT_NE(displays[number], EGL_NO_DISPLAY) << number;
-        EXPECT_EQ(displays[number], displays[0]) << number;
-        EXPECT_TRUE(initialised[number]) << number;
-        EXPECT_EQ(errors[number], 0u) << "thread " << number << " has no context";
-    }
+    ExpectFirstCallsTogetherMeet(THREAD_COUNT, EGL_NO_DISPLAY, EGL_TRUE);
     ASSERT_TRUE(ovo::StereoManager::instance().m_interleave);
     Es1Game game;
     game.Create();

@@ -1,15 +1,10 @@
 // Threads against the recording vendor: many first calls at once, a thread without a
 // context beside a stereo frame, and a context made on one thread and drawn with on another.
-#include <GLES/gl.h>
-#include <GLES2/gl2.h>
-#include <gtest/gtest.h>
-
 #include <filesystem>
 #include <string>
 #include <utility>
 #include <vector>
 
-#include "core/stereo_manager.h"
 #include "support/egl_session.h"
 #include "support/forwarding_check.h"
 #include "support/recorded_calls.h"
@@ -20,37 +15,16 @@ namespace {
 
 constexpr int THREAD_COUNT = 12;
 
-template <typename Result>
-Result EglAnswer(uint32_t index) {
-    return RecorderResult<Result>(RECORDER_API_EGL, index);
-}
-
 TEST(ThreadsOnRecording, FirstCallsOfManyThreadsAtOnceBuildOneManagerAndBindWholeTables) {
     vendor_root::InstallRecorder();
     InstallProfile(OVO_SHADER_PROFILE);
     // The recorder's call log is not made for threads; its answers are.
     RecorderGetState()->m_recording = false;
-    EGLDisplay displays[THREAD_COUNT];
-    EGLBoolean initialised[THREAD_COUNT];
-    GLenum errors[THREAD_COUNT];
-    const ovo::StereoManager* managers[THREAD_COUNT];
-    RunTogether(THREAD_COUNT, [&](int number) {
-        // Half the threads come in through GL, half through EGL.
-        if (number % 2 == 0) errors[number] = glGetError();
-        displays[number] = eglGetDisplay(EGL_DEFAULT_DISPLAY);
-        initialised[number] = eglInitialize(displays[number], nullptr, nullptr);
-        if (number % 2 == 1) errors[number] = glGetError();
-        managers[number] = &ovo::StereoManager::instance();
-    });
-    for (int number = 0; number < THREAD_COUNT; ++number) {
-        EXPECT_EQ(displays[number], EglAnswer<EGLDisplay>(ovo::EGL_ENTRY_eglGetDisplay)) << number;
-        EXPECT_EQ(initialised[number], EglAnswer<EGLBoolean>(ovo::EGL_ENTRY_eglInitialize))
-            << number;
-        EXPECT_EQ(errors[number], 0u) << "thread " << number << " has no context";
-        EXPECT_EQ(managers[number], managers[0]) << number;
-    }
+    ExpectFirstCallsTogetherMeet(
+        THREAD_COUNT, RecorderResult<EGLDisplay>(RECORDER_API_EGL, ovo::EGL_ENTRY_eglGetDisplay),
+        RecorderResult<EGLBoolean>(RECORDER_API_EGL, ovo::EGL_ENTRY_eglInitialize));
     // The one manager read the profile before any display request deleted it.
-    EXPECT_TRUE(managers[0]->m_interleave);
+    EXPECT_TRUE(ovo::StereoManager::instance().m_interleave);
     EXPECT_FALSE(std::filesystem::exists(device_files::Path(ovo::PROFILE_PATH)));
 
     RecorderGetState()->m_recording = true;
@@ -95,8 +69,10 @@ protected:
         return recorded_calls::RecordedGlCalls();
     }
 
-    // Frames drawn while another thread calls GL without a context are the frame drawn alone.
-    void ExpectFramesAsAloneBesideAThreadWithoutAContext() {
+    // Frames drawn under `profile` while another thread calls GL without a context are the
+    // frame drawn alone.
+    void ExpectFramesAsAloneBesideAThreadWithoutAContext(const char* profile) {
+        ASSERT_NO_FATAL_FAILURE(Start(profile));
         Frame();
         const std::vector<std::string> alone = Frame();
         ContextlessCaller caller;
@@ -110,13 +86,11 @@ protected:
 };
 
 TEST_F(ThreadsBesideStereoOnRecording, AThreadWithoutAContextChangesNothingInInterleavedFrames) {
-    Start(OVO_SHADER_PROFILE);
-    ExpectFramesAsAloneBesideAThreadWithoutAContext();
+    ExpectFramesAsAloneBesideAThreadWithoutAContext(OVO_SHADER_PROFILE);
 }
 
 TEST_F(ThreadsBesideStereoOnRecording, AThreadWithoutAContextChangesNothingInPlainFrames) {
-    Start(OVO_PLAIN_PROFILE);
-    ExpectFramesAsAloneBesideAThreadWithoutAContext();
+    ExpectFramesAsAloneBesideAThreadWithoutAContext(OVO_PLAIN_PROFILE);
 }
 
 // The plain mode scales the application's viewport at each draw: another thread's
@@ -133,8 +107,7 @@ TEST_F(ThreadsBesideStereoOnRecording, AThreadWithoutAContextLeavesTheScaledRect
     glDrawArrays(GL_TRIANGLES, 0, 3);
     std::vector<std::string> rectangles;
     for (const std::string& call : recorded_calls::RecordedGlCalls()) {
-        const bool rect = call.rfind("glViewport(", 0) == 0 || call.rfind("glScissor(", 0) == 0;
-        if (rect) rectangles.push_back(call);
+        if (call.rfind("glViewport(", 0) == 0 || call.rfind("glScissor(", 0) == 0) rectangles.push_back(call);
     }
     EXPECT_EQ(rectangles, (std::vector<std::string>{"glViewport(0, 0, 640, 480)",
                                                     "glScissor(0, 0, 640, 480)"}));
