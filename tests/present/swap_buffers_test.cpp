@@ -139,7 +139,8 @@ __attribute__((noinline)) void DirtyTheStack() {
     static_cast<void>(junk[0]);
 }
 
-// Positions without a number are 0; how the text reads is LiveTuning.ReadsAShortFileAsFscanfReadsIt's.
+// Positions without a number are 0; how the text reads is
+// LiveTuning.ReadsAShortFileAsFscanfReadsIt's.
 TEST_F(SwapBuffersTest, TheLiveTuningFileSetsFourParameters) {
     const struct {
         const char* m_text;
