@@ -27,6 +27,13 @@ namespace {
 
 using ovo::GlEntryIndex;
 
+// A glFlush from now on reaches the recording vendor of `api`.
+void ExpectFlushReaches(RecorderApi api) {
+    ResetRecorder();
+    glFlush();
+    EXPECT_NE(FindRecordedCall(api, ovo::GL_ENTRY_glFlush), nullptr);
+}
+
 // The OES names that dispatch to their core operation.
 uint32_t VendorIndexFor(uint32_t index) {
     switch (index) {
@@ -153,23 +160,17 @@ TEST_F(DispatchTest, MakeCurrentFollowsTheLastCreatedContext) {
     EGLContext es2 = m_egl.CreateContext(2);
     m_egl.CreateContext(1);
     ASSERT_EQ(m_egl.MakeCurrent(es2), EGL_TRUE);
-    ResetRecorder();
-    glFlush();
-    EXPECT_NE(FindRecordedCall(RECORDER_API_GLES1, ovo::GL_ENTRY_glFlush), nullptr);
+    ExpectFlushReaches(RECORDER_API_GLES1);
 
     // No attribute list means OpenGL ES 1.x; a failed make-current keeps the thread's table.
     EGLContext plain = eglCreateContext(m_egl.m_display, nullptr, EGL_NO_CONTEXT, nullptr);
     m_egl.CreateContext(2);
     RecorderGetState()->m_make_current_fails = true;
     EXPECT_EQ(m_egl.MakeCurrent(plain), EGL_FALSE);
-    ResetRecorder();
-    glFlush();
-    EXPECT_NE(FindRecordedCall(RECORDER_API_GLES1, ovo::GL_ENTRY_glFlush), nullptr);
+    ExpectFlushReaches(RECORDER_API_GLES1);
     RecorderGetState()->m_make_current_fails = false;
     ASSERT_EQ(m_egl.MakeCurrent(plain), EGL_TRUE);
-    ResetRecorder();
-    glFlush();
-    EXPECT_NE(FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glFlush), nullptr);
+    ExpectFlushReaches(RECORDER_API_GLES2);
 }
 
 TEST(VendorBindingTest, EachKindIsSearchedInGpuTagOrder) {
@@ -184,13 +185,9 @@ TEST(VendorBindingTest, EachKindIsSearchedInGpuTagOrder) {
     egl.Open();
     ASSERT_NE(egl.m_display, EGL_NO_DISPLAY);
     ASSERT_EQ(egl.MakeCurrent(egl.CreateContext(2)), EGL_TRUE);
-    ResetRecorder();
-    glFlush();
-    EXPECT_NE(FindRecordedCall(RECORDER_API_GLES2, ovo::GL_ENTRY_glFlush), nullptr);
+    ExpectFlushReaches(RECORDER_API_GLES2);
     ASSERT_EQ(egl.MakeCurrent(egl.CreateContext(1)), EGL_TRUE);
-    ResetRecorder();
-    glFlush();
-    EXPECT_NE(FindRecordedCall(RECORDER_API_GLES1, ovo::GL_ENTRY_glFlush), nullptr);
+    ExpectFlushReaches(RECORDER_API_GLES1);
 }
 
 TEST(VendorBindingTest, AMissingLibraryGivesNoDisplayAndKeepsWhatWasBound) {
