@@ -25,7 +25,7 @@ OverlayTarget::OverlayTarget(int32_t width, int32_t height, uint32_t flags)
       m_holder() {}
 
 void OverlayTarget::Create() {
-    if (!ServesThisThread() || m_created) return;
+    if (m_created || !ServesThisThread()) return;
     m_created = true;
     if ((m_flags & OVERLAY_CREATE_OBJECTS) == 0) return;
     m_holder.store(std::this_thread::get_id(), std::memory_order_release);
@@ -53,7 +53,7 @@ void OverlayTarget::Create() {
 }
 
 void OverlayTarget::Release() {
-    if (!ServesThisThread() || !m_created) return;
+    if (!m_created || !ServesThisThread()) return;
     if (m_texture != 0) raw::glDeleteTextures(1, &m_texture);
     if (m_framebuffer != 0) raw::glDeleteFramebuffersOES(1, &m_framebuffer);
     m_texture = 0;
