@@ -111,8 +111,6 @@ OVO_EXPORT EGLBoolean EGLAPIENTRY eglMakeCurrent(EGLDisplay dpy, EGLSurface draw
 OVO_EXPORT EGLBoolean EGLAPIENTRY eglReleaseThread() {
     const EGLBoolean result = ovo::vendor_egl::eglReleaseThread();
     if (result != EGL_FALSE) {
-        ovo::StereoManager& manager = ovo::StereoManager::instance();
-        if (manager.m_profile->m_eye_target) manager.m_overlay->LetGo();
         ovo::SelectThreadHooks(false);
         ovo::NoteCurrentBinding(EGL_NO_DISPLAY, EGL_NO_SURFACE, EGL_NO_SURFACE, EGL_NO_CONTEXT);
     }

@@ -61,12 +61,6 @@ void OverlayTarget::Release() {
     m_holder.store(std::thread::id(), std::memory_order_release);
 }
 
-void OverlayTarget::LetGo() {
-    if (m_holder.load(std::memory_order_acquire) == std::this_thread::get_id()) {
-        m_holder.store(std::thread::id(), std::memory_order_release);
-    }
-}
-
 void OverlayTarget::Bind() {
     if (m_bound_framebuffer != 0) return;
     m_bound_framebuffer = m_framebuffer;

@@ -32,9 +32,6 @@ public:
     // Deletes them before the context goes away. The names are forgotten, so a second
     // release deletes nothing (by then the names may be the application's).
     void Release();
-    // The holding thread left its context with eglReleaseThread, the objects still in it:
-    // whichever thread makes that context current next draws with them.
-    void LetGo();
     // The next Create makes the objects again (a new context or window surface).
     void Reset() {
         if (ServesThisThread()) m_created = false;

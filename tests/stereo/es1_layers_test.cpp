@@ -27,14 +27,6 @@ protected:
         ResetRecorder();
     }
 
-    // Every draw is an overlay draw, and the overlay made at a make-current gets framebuffer 7.
-    void OverlayDrawsMakingFramebuffer7() {
-        Profile().m_eye_target = true;
-        AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
-        AnswerMatrix(GL_PROJECTION_MATRIX, ORTHO);
-        Blending(false, GL_ONE, GL_ZERO);
-    }
-
     void Blending(bool enabled, GLint source, GLint destination) {
         AnswerResult(ovo::GL_ENTRY_glIsEnabled, GL_BLEND, enabled ? 1 : 0);
         AnswerIntegers(ovo::GL_ENTRY_glGetIntegerv, GL_BLEND_SRC, {source});
@@ -377,7 +369,10 @@ TEST_F(Es1LayerTest, PendingOverlayIsComposedUnderTheStencilStateOfTheMoment) {
 // after a new context or window surface. The same context and surface made current again
 // drop every overlay draw.
 TEST_F(Es1LayerTest, AfterAReleaseOnlyANewContextOrSurfaceBringsTheOverlayBack) {
-    OverlayDrawsMakingFramebuffer7();
+    Profile().m_eye_target = true;
+    AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
+    AnswerMatrix(GL_PROJECTION_MATRIX, ORTHO);
+    Blending(false, GL_ONE, GL_ZERO);
     const EGLContext game = m_egl.CreateContext(1);
     const struct {
         const char* m_between;
@@ -406,7 +401,10 @@ TEST_F(Es1LayerTest, AfterAReleaseOnlyANewContextOrSurfaceBringsTheOverlayBack) 
 // into the overlay). Once the game has released them, the next context made current takes
 // the overlay, on whichever thread.
 TEST_F(Es1LayerTest, AnotherThreadsContextLeavesTheOverlayToTheThreadThatMadeIt) {
-    OverlayDrawsMakingFramebuffer7();
+    Profile().m_eye_target = true;
+    AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
+    AnswerMatrix(GL_PROJECTION_MATRIX, ORTHO);
+    Blending(false, GL_ONE, GL_ZERO);
     const Calls lifecycle = {"glGenFramebuffersOES", "glDeleteFramebuffersOES", "glDrawArrays"};
     auto loading_thread = [&] {
         std::thread([&] {
@@ -429,22 +427,6 @@ TEST_F(Es1LayerTest, AnotherThreadsContextLeavesTheOverlayToTheThreadThatMadeIt)
     EXPECT_EQ(Only(lifecycle),
               (Calls{"glDeleteFramebuffersOES(1, ptr)", "glGenFramebuffersOES(1, ptr)",
                      "glDrawArrays(4, 0, 3)", "glDeleteFramebuffersOES(1, ptr)"}));
-}
-
-// A context that moves to another thread through eglReleaseThread keeps the overlay's
-// objects in it: the next thread that makes it current draws into them.
-TEST_F(Es1LayerTest, AContextHandedOnByEglReleaseThreadKeepsItsOverlay) {
-    OverlayDrawsMakingFramebuffer7();
-    const EGLContext game = m_egl.CreateContext(1);
-    ASSERT_EQ(m_egl.MakeCurrent(game), EGL_TRUE);
-    ASSERT_NE(eglReleaseThread(), EGL_FALSE);
-    ResetRecorder();
-    std::thread([&] {
-        ASSERT_EQ(m_egl.MakeCurrent(game), EGL_TRUE);
-        m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-    }).join();
-    EXPECT_EQ(Only({"glBindFramebufferOES", "glDrawArrays"}),
-              (Calls{"glBindFramebufferOES(0x8D40, 7)", "glDrawArrays(4, 0, 3)"}));
 }
 
 }  // namespace
