@@ -89,8 +89,6 @@ private:
     bool m_has_content;
     // A default id while no thread holds the objects.
     std::atomic<std::thread::id> m_holder;
-    // Read at every overlay draw, which takes no lock.
-    static_assert(std::atomic<std::thread::id>::is_always_lock_free);
 };
 
 }  // namespace ovo
