@@ -18,7 +18,7 @@ kinds=("$@")
 bash "$root/scripts/install-deps.sh"
 
 # The tests that start threads of their own: the targets that hold them and their names.
-thread_targets=(threads_recording_tests threads_mesa_tests core_tests stereo_tests)
+thread_targets=(threads_recording_tests threads_mesa_tests core_tests)
 thread_tests='Threads'
 
 # The piglit corpus is fetched once, into the normal build tree.
