@@ -33,7 +33,9 @@ void TextureLoader::Start(const PbufferContext& game) {
 void TextureLoader::Load(const PbufferContext& game) {
     PbufferContext own;
     own.BorrowDisplay(game);
+    PauseGame();
     bool ok = own.CreateSurface(1, 1) && own.CreateContext(game.Context()) && own.MakeCurrent();
+    ResumeGame();
     for (int32_t index = 0; ok && index < TEXTURE_COUNT; ++index) {
         ok = WaitForFrames(index);
         if (!ok) break;
@@ -47,7 +49,9 @@ void TextureLoader::Load(const PbufferContext& game) {
     }
     const uint32_t error = TakeGlError();
     if (error != 0) std::fprintf(stderr, "loading thread: GL error 0x%04X\n", error);
+    PauseGame();
     ok = own.Destroy() && ok && error == 0;
+    ResumeGame();
     std::lock_guard<std::mutex> hold(m_lock);
     m_ok = ok;
     m_done = true;
@@ -65,9 +69,24 @@ void TextureLoader::Hand(uint32_t texture) {
 }
 
 void TextureLoader::FrameDrawn() {
+    std::unique_lock<std::mutex> hold(m_lock);
+    ++m_frames_drawn;
+    m_game_paused = m_pause_wanted;
+    m_changed.notify_all();
+    m_changed.wait(hold, [&] { return !m_pause_wanted; });
+    m_game_paused = false;
+}
+
+void TextureLoader::PauseGame() {
+    std::unique_lock<std::mutex> hold(m_lock);
+    m_pause_wanted = true;
+    m_changed.wait(hold, [&] { return m_game_paused || m_stop; });
+}
+
+void TextureLoader::ResumeGame() {
     {
         std::lock_guard<std::mutex> hold(m_lock);
-        ++m_frames_drawn;
+        m_pause_wanted = false;
     }
     m_changed.notify_all();
 }

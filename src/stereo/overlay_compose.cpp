@@ -100,7 +100,7 @@ void PopMatrix(GLenum mode) {
 
 void OverlayTarget::Compose(const ComposeQuad* quads, int32_t quad_count, float y, float w,
                             float h, float z, float t) {
-    if (!HasContent() || m_texture == 0) return;
+    if (!m_has_content || m_texture == 0) return;
     Unbind();
 
     GlStateSnapshot saved;

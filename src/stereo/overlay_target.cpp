@@ -21,14 +21,12 @@ OverlayTarget::OverlayTarget(int32_t width, int32_t height, uint32_t flags)
       m_bound_framebuffer(0),
       m_created(false),
       m_flags(flags),
-      m_has_content(false),
-      m_holder() {}
+      m_has_content(false) {}
 
 void OverlayTarget::Create() {
-    if (m_created || !ServesThisThread()) return;
+    if (m_created) return;
     m_created = true;
     if ((m_flags & OVERLAY_CREATE_OBJECTS) == 0) return;
-    m_holder.store(std::this_thread::get_id(), std::memory_order_release);
 
     m_texture = OVERLAY_TEXTURE_NAME;
     raw::glBindTexture(GL_TEXTURE_2D, m_texture);
@@ -53,12 +51,11 @@ void OverlayTarget::Create() {
 }
 
 void OverlayTarget::Release() {
-    if (!m_created || !ServesThisThread()) return;
+    if (!m_created) return;
     if (m_texture != 0) raw::glDeleteTextures(1, &m_texture);
     if (m_framebuffer != 0) raw::glDeleteFramebuffersOES(1, &m_framebuffer);
     m_texture = 0;
     m_framebuffer = 0;
-    m_holder.store(std::thread::id(), std::memory_order_release);
 }
 
 void OverlayTarget::Bind() {
@@ -68,13 +65,13 @@ void OverlayTarget::Bind() {
 }
 
 void OverlayTarget::Unbind() {
-    if (!ServesThisThread() || m_bound_framebuffer != m_framebuffer) return;
+    if (m_bound_framebuffer != m_framebuffer) return;
     m_bound_framebuffer = 0;
     raw::glBindFramebufferOES(GL_FRAMEBUFFER_OES, 0);
 }
 
 void OverlayTarget::DrawInto(const StereoManager& manager, const DrawCall& draw) {
-    if (!ServesThisThread() || m_framebuffer == 0) return;
+    if (m_framebuffer == 0) return;
     Bind();
     m_has_content = true;
     const GlRect& viewport = manager.m_viewport;
@@ -85,7 +82,7 @@ void OverlayTarget::DrawInto(const StereoManager& manager, const DrawCall& draw)
 }
 
 void OverlayTarget::Clear() {
-    if (!ServesThisThread() || m_framebuffer == 0) return;
+    if (m_framebuffer == 0) return;
     const bool elsewhere = m_bound_framebuffer != m_framebuffer;
     if (elsewhere) raw::glBindFramebufferOES(GL_FRAMEBUFFER_OES, m_framebuffer);
     raw::glViewport(0, 0, OVERLAY_CLEAR_WIDTH, OVERLAY_CLEAR_HEIGHT);
@@ -104,7 +101,7 @@ void OverlayTarget::Clear() {
 }
 
 void OverlayTarget::ClearScreen(GLbitfield mask) {
-    if (ServesThisThread() && m_framebuffer != 0 && m_bound_framebuffer == m_framebuffer) {
+    if (m_framebuffer != 0 && m_bound_framebuffer == m_framebuffer) {
         raw::glBindFramebufferOES(GL_FRAMEBUFFER_OES, 0);
         raw::glClear(mask);
         raw::glBindFramebufferOES(GL_FRAMEBUFFER_OES, m_framebuffer);
@@ -129,7 +126,7 @@ void OverlayTarget::ComposeStereo(const StereoManager& manager, float x, float y
 }
 
 void OverlayTarget::Flush(const StereoManager& manager) {
-    if (!manager.m_profile->m_eye_target || !ServesThisThread()) return;
+    if (!manager.m_profile->m_eye_target) return;
     if (m_has_content) {
         ComposeStereo(manager, 0.0f, 0.0f, 640.0f, 720.0f, 0.0f, 1.0f);
         Clear();

@@ -1,9 +1,7 @@
 #ifndef OVO_STEREO_OVERLAY_TARGET_H
 #define OVO_STEREO_OVERLAY_TARGET_H
 
-#include <atomic>
 #include <cstdint>
-#include <thread>
 
 #include "core/gl_api.h"
 
@@ -20,9 +18,6 @@ constexpr GLuint OVERLAY_TEXTURE_NAME = 65535;
 // An OpenGL ES 1.x game's flat 2D draws (HUD, menus) collected off-screen and later drawn
 // into both eyes with one parallax shift, so that they keep their place in front of the 3D
 // scene. One per process, owned by the manager; all GL calls go straight to the vendor.
-// Its objects belong to the thread that made them until that thread deletes them: another
-// thread's context (a loading thread's) neither makes, deletes nor draws into them, since
-// their names mean nothing there and the holder may be drawing with them at that moment.
 class OverlayTarget {
 public:
     OverlayTarget(int32_t width, int32_t height, uint32_t flags);
@@ -33,25 +28,16 @@ public:
     // release deletes nothing (by then the names may be the application's).
     void Release();
     // The next Create makes the objects again (a new context or window surface).
-    void Reset() {
-        if (ServesThisThread()) m_created = false;
-    }
+    void Reset() { m_created = false; }
     // The application bound `framebuffer` itself.
-    void SetBoundFramebuffer(GLuint framebuffer) {
-        if (ServesThisThread()) m_bound_framebuffer = framebuffer;
-    }
-    // No thread holds the objects, or the calling thread does.
-    bool ServesThisThread() const {
-        const std::thread::id holder = m_holder.load(std::memory_order_acquire);
-        return holder == std::thread::id() || holder == std::this_thread::get_id();
-    }
+    void SetBoundFramebuffer(GLuint framebuffer) { m_bound_framebuffer = framebuffer; }
 
     void Bind();
     void Unbind();
     // One overlay draw, unshifted, with the application's viewport and scissor. Dropped
-    // when there is no framebuffer or another thread holds it.
+    // when there is no framebuffer.
     void DrawInto(const StereoManager& manager, const DrawCall& draw);
-    bool HasContent() const { return ServesThisThread() && m_has_content; }
+    bool HasContent() const { return m_has_content; }
     // Empties the overlay; the binding the application believes in is kept.
     void Clear();
     // The application's clear, always on the window surface.
@@ -87,8 +73,6 @@ private:
     bool m_created;
     uint32_t m_flags;
     bool m_has_content;
-    // A default id while no thread holds the objects.
-    std::atomic<std::thread::id> m_holder;
 };
 
 }  // namespace ovo

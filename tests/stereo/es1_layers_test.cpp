@@ -1,7 +1,6 @@
 // The OpenGL ES 1.x layers: the exact calls of one application draw in each path.
 #include <functional>
 #include <memory>
-#include <thread>
 
 #include "stereo/es1_scaled_layer.h"
 #include "stereo/es1_sprite_stereo_layer.h"
@@ -394,39 +393,6 @@ TEST_F(Es1LayerTest, AfterAReleaseOnlyANewContextOrSurfaceBringsTheOverlayBack) 
         ASSERT_EQ(m_egl.MakeCurrent(each.m_next()), EGL_TRUE);
         EXPECT_EQ(Drawn(m_stereo, {"glDrawArrays"}).size(), each.m_draws) << each.m_between;
     }
-}
-
-// The overlay's objects stay with the thread that made them: a loading thread's context
-// makes, deletes and draws into nothing (its make-current may come while the game draws
-// into the overlay). Once the game has released them, the next context made current takes
-// the overlay, on whichever thread.
-TEST_F(Es1LayerTest, AnotherThreadsContextLeavesTheOverlayToTheThreadThatMadeIt) {
-    Profile().m_eye_target = true;
-    AnswerIntegers(ovo::GL_ENTRY_glGenFramebuffersOES, 1, {7});
-    AnswerMatrix(GL_PROJECTION_MATRIX, ORTHO);
-    Blending(false, GL_ONE, GL_ZERO);
-    const Calls lifecycle = {"glGenFramebuffersOES", "glDeleteFramebuffersOES", "glDrawArrays"};
-    auto loading_thread = [&] {
-        std::thread([&] {
-            ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(1)), EGL_TRUE);
-            m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-            ASSERT_EQ(m_egl.MakeCurrent(EGL_NO_CONTEXT), EGL_TRUE);
-        }).join();
-    };
-    ASSERT_EQ(m_egl.MakeCurrent(m_egl.CreateContext(1)), EGL_TRUE);
-    ResetRecorder();
-    loading_thread();
-    EXPECT_EQ(Only(lifecycle), Calls{});
-    m_stereo.glDrawArrays(Manager(), GL_TRIANGLES, 0, 3);
-    EXPECT_EQ(Only({"glBindFramebufferOES", "glDrawArrays"}),
-              (Calls{"glBindFramebufferOES(0x8D40, 7)", "glDrawArrays(4, 0, 3)"}));
-
-    ResetRecorder();
-    ASSERT_EQ(m_egl.MakeCurrent(EGL_NO_CONTEXT), EGL_TRUE);
-    loading_thread();
-    EXPECT_EQ(Only(lifecycle),
-              (Calls{"glDeleteFramebuffersOES(1, ptr)", "glGenFramebuffersOES(1, ptr)",
-                     "glDrawArrays(4, 0, 3)", "glDeleteFramebuffersOES(1, ptr)"}));
 }
 
 }  // namespace
